@@ -1,0 +1,16 @@
+# zv_add_test(NAME SOURCES ... LIBS ... LABELS ... [FIXTURES ...] [TIMEOUT s])
+# One QTest program registered with CTest, run offscreen.
+function(zv_add_test name)
+    cmake_parse_arguments(T "" "TIMEOUT" "SOURCES;LIBS;LABELS;FIXTURES" ${ARGN})
+    add_executable(${name} ${T_SOURCES})
+    target_link_libraries(${name} PRIVATE ${T_LIBS} zv_test_support Qt6::Test)
+    add_test(NAME ${name} COMMAND ${name} -platform offscreen)
+    if(NOT T_TIMEOUT)
+        set(T_TIMEOUT 120)
+    endif()
+    set_tests_properties(${name} PROPERTIES LABELS "${T_LABELS}" TIMEOUT ${T_TIMEOUT}
+        ENVIRONMENT "QT_QPA_PLATFORM=offscreen;ZV_TEST_BUILD_DIR=${CMAKE_BINARY_DIR}")
+    if(T_FIXTURES)
+        set_tests_properties(${name} PROPERTIES FIXTURES_REQUIRED "${T_FIXTURES}")
+    endif()
+endfunction()

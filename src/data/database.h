@@ -1,0 +1,70 @@
+#pragma once
+// One open database: a file database (SQLite in the role of the suite's Jet files) or a
+// server database (SQL Server through ODBC, or PostgreSQL). Opened per operation, closed
+// by GClose or the destructor; nothing stays open between operations.
+
+#include <QSqlDatabase>
+#include <QString>
+#include <memory>
+
+namespace zv {
+
+class Recordset;
+
+enum class DbKind { File, Server };
+
+// Recordset types of the file kind (DAO values).
+enum : int { dbOpenDynaset = 2, dbOpenSnapshot = 4 };
+
+// The Connect argument of the password-protected file databases (MADAD, MAIN). Carried and
+// ignored: SQLite files have no password.
+QString SuitePasswordConnect();
+
+class Database {
+  public:
+    ~Database();
+    Database(const Database&) = delete;
+    Database& operator=(const Database&) = delete;
+
+    // MainPath + file, file as the suite names it with its leading separator ("\MDOCS.MDB").
+    // A missing file is error 3024, never a new empty database.
+    static std::unique_ptr<Database> OpenFile(const QString& file, const QString& connect = {});
+    // Logical database name ("MDOCS"): connects with GetConnectionByDbName(name) and then
+    // sends "USE " + name + VolnaGlobNum.
+    static std::unique_ptr<Database> OpenServer(const QString& name);
+    // A server connection from a connection string alone, without USE (the list windows).
+    static std::unique_ptr<Database> OpenConnectionString(const QString& connectionString);
+    // The logical database on the back-end its flag chooses: the server when onServer,
+    // otherwise the file "\" + name + ".MDB".
+    static std::unique_ptr<Database> Open(const QString& name, bool onServer);
+
+    DbKind Kind() const { return kind_; }
+    bool IsServer() const { return kind_ == DbKind::Server; }
+    bool IsPostgres() const;
+
+    // Runs a statement that returns no rows. Throws VbError.
+    void Execute(const QString& sql);
+    // Opens a recordset on a query: file kind with DAO behaviour (type dbOpenDynaset or
+    // dbOpenSnapshot), server kind with ADO keyset/optimistic behaviour. Throws VbError.
+    std::unique_ptr<Recordset> OpenRecordset(const QString& sql, int type = dbOpenDynaset);
+
+    // The text as the engine receives it: the file kind accepts the suite's Jet texts
+    // ("DELETE * FROM"), PostgreSQL gets the adapted T-SQL text.
+    QString EngineSql(const QString& sql) const;
+    // The Qt connection, for lazily fetched models of the list windows.
+    QSqlDatabase Handle() const;
+    QString ConnectionName() const { return connectionName_; }
+
+    void Close();
+
+  private:
+    Database(DbKind kind, QString connectionName);
+    DbKind kind_;
+    QString connectionName_;
+};
+
+// Closes and releases; never throws, never reports. Leaves the pointer empty.
+void GClose(std::unique_ptr<Database>& db);
+void GClose(std::unique_ptr<Recordset>& rs);
+
+}  // namespace zv

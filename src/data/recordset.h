@@ -1,0 +1,79 @@
+#pragma once
+// A recordset of either kind. The file kind behaves as a DAO recordset (EditMode,
+// Bookmark, LastModified, Name); the server kind as a client-side ADO keyset recordset
+// (KEYCOLUMN, Requery, Find, Source). Saving issues a parameterised INSERT or UPDATE by the
+// table's primary key and reads back a generated key.
+
+#include <QString>
+#include <QVariant>
+#include <memory>
+
+#include "data/database.h"
+
+namespace zv {
+
+// DAO edit modes.
+enum : int { dbEditNone = 0, dbEditInProgress = 1, dbEditAdd = 2 };
+
+class Recordset {
+  public:
+    ~Recordset();
+    Recordset(const Recordset&) = delete;
+    Recordset& operator=(const Recordset&) = delete;
+
+    DbKind Kind() const;
+    bool IsServer() const { return Kind() == DbKind::Server; }
+
+    // Fields, by name without regard to case. An unknown name is error 3265.
+    int FieldCount() const;
+    QString FieldName(int index) const;
+    bool HasField(const QString& name) const;
+    // The current row's value (or the pending edit's). A SQL NULL is a null QVariant.
+    QVariant Value(const QString& name) const;
+    // File kind: only inside AddNew/Edit (error 3020 otherwise). Server kind: edits the
+    // current row in place, saved by Update.
+    void SetValue(const QString& name, const QVariant& value);
+
+    // Position
+    int RecordCount() const;
+    int AbsolutePosition() const;  // 0-based; -1 when not on a row
+    bool BOF() const;
+    bool EOF() const;
+    void MoveFirst();
+    void MoveLast();
+    void MoveNext();
+    void MovePrevious();
+
+    // Editing
+    void AddNew();
+    void Edit();  // file kind
+    void Update();
+    void CancelUpdate();
+    int EditMode() const;
+
+    // File kind
+    QVariant Bookmark() const;
+    void SetBookmark(const QVariant& bookmark);
+    QVariant LastModified() const;
+    QString Name() const;  // the query text
+
+    // Server kind
+    QString KeyColumn() const;  // first primary-key column of the table; empty when none
+    QString Source() const;
+    void SetSource(const QString& sql);
+    void Requery();
+    void Find(const QString& criterion);  // "ID=1234": moves to the first match or to EOF
+    void Open();
+    void Close();
+    bool IsOpen() const;
+
+    std::unique_ptr<Recordset> Clone() const;
+
+  private:
+    friend class Database;
+    struct Impl;
+    explicit Recordset(std::unique_ptr<Impl> impl);
+    std::unique_ptr<Impl> d_;
+};
+
+}  // namespace zv
