@@ -18,6 +18,10 @@ bool IsFileExist(const QString& path, bool deleteIfExist = false, bool createIfM
 // Whether a folder exists; with createIfMissing it is created first with its parents.
 bool IsFolderExist(const QString& path, bool createIfMissing = false);
 
+// Creates one folder whose parent exists (an existing folder is fine); throws the
+// runtime's VbError (76 path not found, 70 permission denied, ...) when it cannot.
+void MakeFolder(const QString& path);
+
 // Creates a folder with every missing parent, one level at a time. The server part of a
 // network path ("\\server\share\...") is never created. Returns whether the folder exists
 // at the end; a level that cannot be created is reported and the next one is tried.
