@@ -12,6 +12,7 @@ struct State {
     QString sourceExt, badFileChars;
     QString userCode;
     QMap<QString, QString> optKeyNames;
+    QString medFontNameSpe;
     double medFontSizeSpe = 0;
 };
 
@@ -64,6 +65,12 @@ const QMap<QString, QString>& OptKeyNames() {
 }
 void SetOptKeyNames(const QMap<QString, QString>& v) {
     S().optKeyNames = v;
+}
+const QString& MedFontNameSpeCache() {
+    return S().medFontNameSpe;
+}
+void SetMedFontNameSpeCache(const QString& v) {
+    S().medFontNameSpe = v;
 }
 double MedFontSizeSpeCache() {
     return S().medFontSizeSpe;

@@ -56,7 +56,9 @@ void SetUserCode(const QString& v);
 const QMap<QString, QString>& OptKeyNames();
 void SetOptKeyNames(const QMap<QString, QString>& v);
 
-// Font fixer's cache of the special medium font size
+// Font fixer's cache of the special medium font name and size
+const QString& MedFontNameSpeCache();
+void SetMedFontNameSpeCache(const QString& v);
 double MedFontSizeSpeCache();
 void SetMedFontSizeSpeCache(double v);
 
