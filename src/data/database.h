@@ -2,6 +2,11 @@
 // One open database: a file database (SQLite in the role of the suite's Jet files) or a
 // server database (SQL Server through ODBC, or PostgreSQL). Opened per operation, closed
 // by GClose or the destructor; nothing stays open between operations.
+//
+// File databases store Booleans as 1/0 and dates as "yyyy-MM-dd HH:mm:ss" text (the zero
+// date is "1899-12-30 00:00:00"). Columns declared DATE/DATETIME/TIME read back as
+// QDateTime, columns declared BOOLEAN/BIT/YESNO as bool. Values written as bool or
+// QDateTime are stored in those forms on every engine.
 
 #include <QSqlDatabase>
 #include <QString>
@@ -10,8 +15,11 @@
 namespace zv {
 
 class Recordset;
+class Connection;
 
 enum class DbKind { File, Server };
+
+constexpr int kFileBusyTimeoutMs = 5000;
 
 // Recordset types of the file kind (DAO values).
 enum : int { dbOpenDynaset = 2, dbOpenSnapshot = 4 };
@@ -27,7 +35,8 @@ class Database {
     Database& operator=(const Database&) = delete;
 
     // MainPath + file, file as the suite names it with its leading separator ("\MDOCS.MDB").
-    // A missing file is error 3024, never a new empty database.
+    // A missing file is error 3024, never a new empty database. Writers wait on each other
+    // up to kFileBusyTimeoutMs before a lock is error 3260.
     static std::unique_ptr<Database> OpenFile(const QString& file, const QString& connect = {});
     // Logical database name ("MDOCS"): connects with GetConnectionByDbName(name) and then
     // sends "USE " + name + VolnaGlobNum.
@@ -58,9 +67,11 @@ class Database {
     void Close();
 
   private:
-    Database(DbKind kind, QString connectionName);
+    Database(DbKind kind, std::shared_ptr<Connection> connection);
     DbKind kind_;
     QString connectionName_;
+    // Shared with the recordsets opened here; the Qt connection goes with the last holder.
+    std::shared_ptr<Connection> connection_;
 };
 
 // Closes and releases; never throws, never reports. Leaves the pointer empty.

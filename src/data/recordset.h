@@ -2,11 +2,22 @@
 // A recordset of either kind. The file kind behaves as a DAO recordset (EditMode,
 // Bookmark, LastModified, Name); the server kind as a client-side ADO keyset recordset
 // (KEYCOLUMN, Requery, Find, Source). Saving issues a parameterised INSERT or UPDATE by the
-// table's primary key and reads back a generated key.
+// table's primary key (or, without one, by the row's values as read) and reads the saved
+// row back, generated key included. The rows of the query are held in memory: recordsets
+// are for small results; the list windows use a lazily fetched model on Handle().
+//
+// After Update of a new row the file kind stays where it was (LastModified names the new
+// row); the server kind moves onto the new row. Moving the server kind off an edited row
+// saves it first.
 
 #include <QString>
 #include <QVariant>
+#include <cstdio>
 #include <memory>
+
+// The recordset property EOF shares its name with the C library's end-of-file macro, which
+// nothing in this program uses; stdio is included first so that it cannot come back.
+#undef EOF
 
 #include "data/database.h"
 
@@ -36,7 +47,7 @@ class Recordset {
 
     // Position
     int RecordCount() const;
-    int AbsolutePosition() const;  // 0-based; -1 when not on a row
+    int AbsolutePosition() const;  // 0-based on both kinds; -1 when not on a row
     bool BOF() const;
     bool EOF() const;
     void MoveFirst();
@@ -73,6 +84,8 @@ class Recordset {
     friend class Database;
     struct Impl;
     explicit Recordset(std::unique_ptr<Impl> impl);
+    static std::unique_ptr<Recordset> OpenOn(std::shared_ptr<Connection> connection, DbKind kind,
+                                             const QString& sql, int type);
     std::unique_ptr<Impl> d_;
 };
 
