@@ -75,6 +75,7 @@ void CreateServerDatabases(const SampleOptions& options, const SampleData& data)
         {
             ScopedConnection admin(options, QStringLiteral("postgres"));
             const QString quoted = QLatin1Char('"') + database + QLatin1Char('"');
+            ExecOrThrow(admin.db(), QStringLiteral("SET client_min_messages = warning"));
             ExecOrThrow(admin.db(),
                         QStringLiteral("DROP DATABASE IF EXISTS %1 WITH (FORCE)").arg(quoted));
             ExecOrThrow(admin.db(),
@@ -82,6 +83,8 @@ void CreateServerDatabases(const SampleOptions& options, const SampleData& data)
                             .arg(quoted));
         }
         ScopedConnection target(options, database);
+        // Room for building the trigram indexes of a large installation in memory.
+        ExecOrThrow(target.db(), QStringLiteral("SET maintenance_work_mem = '256MB'"));
         BuildDatabase(target.db(), name, SchemaStatements(schema, name), data);
     }
 }
