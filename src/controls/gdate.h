@@ -129,6 +129,9 @@ class GDate : public QFrame {
 
     void Refresh();
 
+    QSize sizeHint() const override;
+    QSize minimumSizeHint() const override;
+
     // Children, for the owner's keyboard handling and for tests.
     DateBox& TDBDate1() const { return *box_; }
     QAbstractButton& CmdNow() const { return *now_; }
@@ -163,7 +166,7 @@ class GDate : public QFrame {
     QAbstractButton* now_;
     int16_t ratio_ = 0;
     QString caption_;
-    QString version_ = QStringLiteral("0");
+    QString dataField_;
     bool hideNow_ = false;
     bool dontSelData_ = false;
     int backStyle_ = 1;
