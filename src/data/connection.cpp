@@ -5,6 +5,7 @@
 #include <QDateTime>
 #include <QRegularExpression>
 #include <QSqlDriver>
+#include <QSqlIndex>
 
 #include "data/pg_dialect.h"
 
@@ -100,6 +101,34 @@ QString Connection::QuoteIdentifier(const QString& name) const {
 
 QString Connection::CatalogueName(const QString& table) const {
     return engine_ == Engine::Postgres ? table.toLower() : table;
+}
+
+QStringList Connection::KeyColumns(const QString& table) const {
+    QStringList columns;
+    const QSqlIndex pk = Db().driver()->primaryIndex(CatalogueName(table));
+    for (int k = 0; k < pk.count(); ++k) {
+        columns << pk.fieldName(k);
+    }
+    if (!columns.isEmpty() || engine_ != Engine::Sqlite) {
+        return columns;
+    }
+    QSqlQuery list(Db());
+    list.exec(QStringLiteral("PRAGMA index_list(%1)").arg(QuoteIdentifier(table)));
+    QStringList unique;
+    while (list.next()) {
+        if (list.value(QStringLiteral("unique")).toInt() == 1) {
+            unique << list.value(QStringLiteral("name")).toString();
+        }
+    }
+    // index_list gives the newest index first; the oldest is the table's own key.
+    for (auto it = unique.crbegin(); it != unique.crend() && columns.isEmpty(); ++it) {
+        QSqlQuery info(Db());
+        info.exec(QStringLiteral("PRAGMA index_info(%1)").arg(QuoteIdentifier(*it)));
+        while (info.next()) {
+            columns << info.value(QStringLiteral("name")).toString();
+        }
+    }
+    return columns;
 }
 
 QVariant Connection::ToEngine(const QVariant& value) {

@@ -34,6 +34,9 @@ class Connection {
     QString QuoteIdentifier(const QString& name) const;
     // A table name as the engine's catalogue knows it (PostgreSQL: folded to lower case).
     QString CatalogueName(const QString& table) const;
+    // The columns that identify a row of a table: its primary key, or on a file database
+    // without one, its first unique index (the suite's file tables often have only that).
+    QStringList KeyColumns(const QString& table) const;
 
     // How the engine stores a value bound from the program: Booleans as 1/0, dates as
     // "yyyy-MM-dd HH:mm:ss".

@@ -3,7 +3,6 @@
 #include <QRegularExpression>
 #include <QSqlDriver>
 #include <QSqlField>
-#include <QSqlIndex>
 #include <QSqlRecord>
 #include <QVector>
 
@@ -128,13 +127,15 @@ struct Recordset::Impl {
         if (table.isEmpty()) {
             return;
         }
-        const QSqlIndex pk = conn->Db().driver()->primaryIndex(conn->CatalogueName(table));
+        const QStringList keys = conn->KeyColumns(table);
         for (const QString& f : fields) {
-            for (int k = 0; k < pk.count(); ++k) {
-                if (pk.fieldName(k).compare(f, Qt::CaseInsensitive) == 0) {
-                    keyFields << f;
-                }
+            if (keys.contains(f, Qt::CaseInsensitive)) {
+                keyFields << f;
             }
+        }
+        // A key that the query does not select cannot find the row again.
+        if (keyFields.size() != keys.size()) {
+            keyFields.clear();
         }
     }
 
@@ -245,7 +246,15 @@ struct Recordset::Impl {
             return original;
         }
         // By the primary key; without one, by every value as it was read.
-        QStringList where = keyFields.isEmpty() ? fields : keyFields;
+        QStringList where = keyFields;
+        for (const QString& k : keyFields) {
+            if (IsNullVal(original[FieldIndex(k)])) {
+                where.clear();  // a unique index admits many Nulls
+            }
+        }
+        if (where.isEmpty()) {
+            where = fields;
+        }
         for (const QString& f : where) {
             const QVariant& v = original[FieldIndex(f)];
             if (IsNullVal(v) || !v.isValid()) {

@@ -69,7 +69,9 @@ class Recordset {
     QString Name() const;  // the query text
 
     // Server kind
-    QString KeyColumn() const;  // first primary-key column of the table; empty when none
+    // First column of the table's key: its primary key, or on a file database without one,
+    // its first unique index. Empty when the table has none.
+    QString KeyColumn() const;
     QString Source() const;
     void SetSource(const QString& sql);
     void Requery();
