@@ -94,6 +94,10 @@ void ForceDelete(const QString& path) {
 
 }  // namespace
 
+VbError FileSystemError(int code) {
+    return FsError(code);
+}
+
 void MakeFolder(const QString& path) {
     std::error_code ec;
     fs::create_directory(FsPath(path), ec);

@@ -4,6 +4,8 @@
 
 #include <QString>
 
+#include "util/errors.h"
+
 namespace zv {
 
 // The path as the file system of this platform spells it ("\" and "/" both accepted).
@@ -17,6 +19,10 @@ bool IsFileExist(const QString& path, bool deleteIfExist = false, bool createIfM
 
 // Whether a folder exists; with createIfMissing it is created first with its parents.
 bool IsFolderExist(const QString& path, bool createIfMissing = false);
+
+// The runtime's error for a failed file-system call with this errno value (76 path not
+// found, 70 permission denied, 58 file already exists, else 75).
+VbError FileSystemError(int code);
 
 // Creates one folder whose parent exists (an existing folder is fine); throws the
 // runtime's VbError (76 path not found, 70 permission denied, ...) when it cannot.
