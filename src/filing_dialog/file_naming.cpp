@@ -1,0 +1,136 @@
+#include "filing_dialog/file_naming.h"
+
+#include <QDir>
+#include <QFile>
+#include <array>
+#include <cmath>
+#include <filesystem>
+#include <system_error>
+
+#include "data/values.h"
+#include "util/errors.h"
+#include "util/file_utils.h"
+#include "util/state.h"
+#include "util/ui.h"
+
+namespace zv {
+namespace {
+
+bool IsSeparator(QChar c) {
+    return c == QLatin1Char('\\') || c == QLatin1Char('/');
+}
+
+qsizetype LastSeparator(const QString& path) {
+    return std::max(path.lastIndexOf(QLatin1Char('\\')), path.lastIndexOf(QLatin1Char('/')));
+}
+
+// The number after the letter in a numbered name ("T12.doc" -> 12): the name up to its last
+// dot (the whole name when no dot follows the first character) without its first character,
+// rounded to the nearest whole number; anything not numeric counts as 0.
+double NumberOf(const QString& name) {
+    const qsizetype dot = name.lastIndexOf(QLatin1Char('.'));
+    const QString stem = dot > 0 ? name.left(dot) : name;
+    return std::nearbyint(GetDblFromStr(stem.mid(1)));
+}
+
+}  // namespace
+
+bool EndsWithSeparator(const QString& path) {
+    return !path.isEmpty() && IsSeparator(path.back());
+}
+
+QString CCpath(const QString& path) {
+    if (path.isEmpty()) {
+        MsgBox(QStringLiteral("אין הגדרת ספריה לעבודה"), vbCritical);
+        return {};
+    }
+    return EndsWithSeparator(path) ? path : path + QDir::separator();
+}
+
+QString TruncateFileName(const QString& path) {
+    const qsizetype sep = LastSeparator(path);
+    return sep < 0 ? path : path.mid(sep + 1);
+}
+
+QString GetNextFileName(const QString& folder, const QString& ext, const QString& letter) {
+    if (folder.isEmpty()) {
+        return {};
+    }
+    QString result;
+    Step([](const VbError& e) { return FormatWithLine(QStringLiteral("GetNextFileName"), e); },
+         [&] {
+             const QString dir = CCpath(folder);
+             BuildDirTree(dir);
+             // One pass over the names; the entry kind comes from the directory listing itself,
+             // and only names starting with the letter are looked at further.
+             std::error_code ec;
+             std::filesystem::directory_iterator it(QFile::encodeName(DiskPath(dir)).toStdString(),
+                                                    ec);
+             if (ec) {
+                 if (IsDevelopmentRun()) {
+                     MsgBox(QStringLiteral("בעיה בהגדרת אוביקט קריאת נתוני ספריה") +
+                                QStringLiteral("\r\n") + dir,
+                            vbExclamation);
+                 }
+                 throw MakeError(err::PathNotFound);
+             }
+             double max = 0;
+             for (const auto& entry : it) {
+                 const QString name = QFile::decodeName(entry.path().filename().c_str());
+                 if (!name.startsWith(letter, Qt::CaseInsensitive)) {
+                     continue;
+                 }
+                 std::error_code typeError;
+                 if (!entry.is_regular_file(typeError)) {
+                     continue;
+                 }
+                 max = std::max(max, NumberOf(name));
+             }
+             result = dir.toUpper() + letter + QString::number(max + 1, 'f', 0);
+             if (!ext.isEmpty()) {
+                 result += QLatin1Char('.') + ext;
+             }
+         });
+    return result;
+}
+
+std::optional<DocType> DocTypeOf(const QString& sourceName) {
+    static const std::array<std::pair<const char*, const char*>, 10> table{{{".DOC", "T"},
+                                                                            {".XLS", "X"},
+                                                                            {".TXT", "N"},
+                                                                            {".MSG", "E"},
+                                                                            {".HTM", "E"},
+                                                                            {".EML", "E"},
+                                                                            {".PDF", "S"},
+                                                                            {".TIF", "S"},
+                                                                            {".PPT", "P"},
+                                                                            {".DOCX", "T"}}};
+    const QString upper = sourceName.toUpper();
+    for (const auto& [dotExt, letter] : table) {
+        const QString e = QString::fromLatin1(dotExt);
+        if (upper.right(e.size()) == e) {
+            return DocType{QString::fromLatin1(letter), e.mid(1)};
+        }
+    }
+    return std::nullopt;
+}
+
+std::optional<QString> NumberedName(const QString& defultName, const QString& sourceExt,
+                                    const QString& selectedFolder) {
+    if (selectedFolder.isEmpty()) {
+        return std::nullopt;
+    }
+    const QString source = defultName + QLatin1Char('.') + sourceExt;
+    const QString folder = CCpath(selectedFolder);
+    const auto type = DocTypeOf(source);
+    const QString proposal =
+        type ? GetNextFileName(folder, type->ext, type->letter) : folder + TruncateFileName(source);
+    if (proposal.isEmpty()) {
+        return std::nullopt;
+    }
+    const QString name = TruncateFileName(proposal);
+    const qsizetype dot = name.lastIndexOf(QLatin1Char('.'));
+    return dot < 0 ? name : name.left(dot);
+}
+
+}  // namespace zv
