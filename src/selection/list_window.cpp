@@ -18,6 +18,7 @@
 #include "data/database.h"
 #include "selection/kind_text.h"
 #include "selection/list_model.h"
+#include "ui/font_fix.h"
 #include "util/errors.h"
 #include "util/file_utils.h"
 #include "util/keyboard_layout.h"
@@ -221,6 +222,7 @@ void ListWindow::showEvent(QShowEvent* event) {
 
 void ListWindow::Load() {
     isCancel_ = false;
+    FixControlsFontOnMe(*this);
     const QString folder = MainPath() + QStringLiteral("\\MGRX\\") + MyUser();
     layoutFile_ = DiskPath(
         folder + (IsNames() ? QStringLiteral("\\AddInLF.grx") : QStringLiteral("\\AddInLak.grx")));
