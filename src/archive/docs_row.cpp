@@ -112,27 +112,27 @@ class DocRowWriter {
         if (file.exists()) {
             Set(QStringLiteral("DateCreated"), CreationTime(file));
         }
-        Set(QStringLiteral("FULLNAME"), rel);
-        Set(QStringLiteral("ShortName"), rel.mid(rel.lastIndexOf(QLatin1Char('\\')) + 1));
-        Set(QStringLiteral("DirPath"), rel.left(rel.lastIndexOf(QLatin1Char('\\')) + 1));
+        SetText(QStringLiteral("FULLNAME"), rel);
+        SetText(QStringLiteral("ShortName"), rel.mid(rel.lastIndexOf(QLatin1Char('\\')) + 1));
+        SetText(QStringLiteral("DirPath"), rel.left(rel.lastIndexOf(QLatin1Char('\\')) + 1));
         Set(QStringLiteral("DirMone"), 0);
 
         if (details) {
             SetFromDialog(*details);
         } else {
-            Set(QStringLiteral("Metapel"), MyUserName());
-            Set(QStringLiteral("Teur"), QString());
-            Set(QStringLiteral("SecTeur"), QString());
+            SetText(QStringLiteral("Metapel"), MyUserName());
+            SetText(QStringLiteral("Teur"), {});
+            SetText(QStringLiteral("SecTeur"), {});
             Set(QStringLiteral("PARTOF"), 0);
             Set(QStringLiteral("Status"), 2);
         }
         Set(QStringLiteral("Source"), 9);
         if (details) {
-            Set(QStringLiteral("CLIENT_NUM"), details->clientNumber);
-            Set(QStringLiteral("SUG"), details->kindLetter);
+            SetText(QStringLiteral("CLIENT_NUM"), details->clientNumber);
+            SetText(QStringLiteral("SUG"), details->kindLetter);
             Set(QStringLiteral("IDTik"), int(GetIntFromStr(details->subKind)));
-            Set(QStringLiteral("TIK"), details->caseNumber);
-            Set(QStringLiteral("NUM"), details->caseCode);
+            SetText(QStringLiteral("TIK"), details->caseNumber);
+            SetText(QStringLiteral("NUM"), details->caseCode);
         }
 
         if (Save() != 0) {
@@ -143,18 +143,18 @@ class DocRowWriter {
     }
 
     void SetFromDialog(const DocDetails& d) {
-        Set(QStringLiteral("Metapel"), d.handlers);
-        Set(QStringLiteral("Teur"), d.description);
-        Set(QStringLiteral("SecTeur"), d.moreDescription);
+        SetText(QStringLiteral("Metapel"), d.handlers);
+        SetText(QStringLiteral("Teur"), d.description);
+        SetText(QStringLiteral("SecTeur"), d.moreDescription);
         Set(QStringLiteral("IsMemo"), !d.reminder);
         if (d.reminder) {
             Set(QStringLiteral("MemoDate"), DateBoxValue(d.reminderDate));
-            Set(QStringLiteral("MemoHour"), MemoHourText(d.reminderTime));
+            SetText(QStringLiteral("MemoHour"), MemoHourText(d.reminderTime));
             Set(QStringLiteral("IsJumpMemo"), d.popup);
         }
         Set(QStringLiteral("RecieveDate"), DateBoxValue(d.receivedDate));
         Set(QStringLiteral("LastModificationTime"), Now());
-        Set(QStringLiteral("LastModificationUser"), MyUserName());
+        SetText(QStringLiteral("LastModificationUser"), MyUserName());
         if (d.createdUnlocked) {
             Set(QStringLiteral("DateCreated"), DateBoxValue(d.createdDate));
         }
@@ -195,6 +195,11 @@ class DocRowWriter {
 
     void Set(const QString& field, const QVariant& value) {
         Do([&] { rs_->SetValue(field, value); });
+    }
+
+    // Text columns hold a string, empty rather than Null when there is no text.
+    void SetText(const QString& field, const QString& text) {
+        Set(field, text.isNull() ? QStringLiteral("") : text);
     }
 
     // One statement: a duplicate ends the recording silently, any other failure is

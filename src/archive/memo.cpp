@@ -108,14 +108,14 @@ class MemoWriter {
         }
     }
 
-    // One statement: a duplicate is skipped silently, any other failure is reported and
-    // the next statement runs.
+    // One statement: a duplicate (of either back-end) is skipped silently, any other
+    // failure is reported and the next statement runs.
     void Do(const std::function<void()>& statement) {
         try {
             statement();
         } catch (const std::exception& e) {
             const VbError error = AsVbError(e);
-            if (error.Number() == err::JetDuplicate) {
+            if (error.Number() == err::JetDuplicate || error.Number() == err::ServerIntegrity) {
                 return;
             }
             MsgBox(QLatin1Char(' ') + QString::number(error.Number()) +
