@@ -41,7 +41,6 @@ class TestFrmSaveAs : public QObject {
     void extensionLists();
     void confirmsWithoutEditing_data();
     void confirmsWithoutEditing();
-    void confirmsEditedChoice();
     void cancels_data();
     void cancels();
 
@@ -157,26 +156,6 @@ void TestFrmSaveAs::confirmsWithoutEditing() {
     QCOMPARE(frm.TxtName().text(), QStringLiteral("חוזה שכירות"));
     // The first of the list, not the extension the proposed name had.
     QCOMPARE(frm.CboEndName().currentText(), QStringLiteral("Doc"));
-}
-
-void TestFrmSaveAs::confirmsEditedChoice() {
-    test::Watchdog watchdog;
-    FrmSaveAs frm;
-    frm.SetFileName(QStringLiteral("C:\\DOCS\\MAILIN\\subject.msg"));
-    (*ui_)->QueueModal([](QWidget& w) {
-        FrmSaveAs& f = AsSaveAs(w);
-        f.TxtName().clear();
-        for (const QChar ch : QStringLiteral("נושא 2")) {
-            QTest::sendKeyEvent(QTest::Click, &f.TxtName(), Qt::Key_unknown, QString(ch),
-                                Qt::NoModifier);
-        }
-        f.CboEndName().setCurrentIndex(1);
-        f.CmdSave().click();
-    });
-    ShowModal(frm);
-    QVERIFY(!frm.IsCancel());
-    QCOMPARE(frm.TxtName().text(), QStringLiteral("נושא 2"));
-    QCOMPARE(frm.CboEndName().currentText(), QStringLiteral("eml"));
 }
 
 void TestFrmSaveAs::cancels_data() {
