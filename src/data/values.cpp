@@ -41,7 +41,7 @@ bool NumericValue(const QVariant& value, double& out, bool& overflow) {
     bool ok = false;
     out = QLocale::c().toDouble(text, &ok);
     if (ok) {
-        return true;
+        return std::isfinite(out);  // "inf" and "nan" are words, not numbers
     }
     // A well-formed number beyond the range of a double is numeric and overflows.
     const QByteArray latin = text.toLatin1();

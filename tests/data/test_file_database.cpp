@@ -50,6 +50,7 @@ class TestFileDatabase : public QObject {
 
     void missingFileIsAnErrorAndNotCreated();
     void eachOpenHasItsOwnConnection();
+    void folderWithHebrewAndUriCharacters();
     void jetTexts_data();
     void jetTexts();
     void deleteStar();
@@ -145,6 +146,14 @@ void TestFileDatabase::eachOpenHasItsOwnConnection() {
     GClose(b);
     QVERIFY(!b);
     QCOMPARE(QSqlDatabase::connectionNames(), before);
+}
+
+void TestFileDatabase::folderWithHebrewAndUriCharacters() {
+    const QString folder = main_ + QStringLiteral("/תיק משותף #1?x=%20");
+    test::MakeFileDb(folder, QStringLiteral("PUB"), {QStringLiteral("CREATE TABLE USERS (A)")});
+    SetMainPath(folder);
+    auto db = Database::OpenFile(QStringLiteral("\\PUB.MDB"));
+    QCOMPARE(db->OpenRecordset(QStringLiteral("SELECT * FROM USERS"))->FieldCount(), 1);
 }
 
 void TestFileDatabase::jetTexts_data() {

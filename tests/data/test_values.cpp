@@ -45,6 +45,9 @@ void TestValues::intFromStr_data() {
     QTest::newRow("below min") << QVariant(QStringLiteral("-32769")) << 0;
     QTest::newRow("huge") << QVariant(QStringLiteral("1e400")) << 0;
     QTest::newRow("abc") << QVariant(QStringLiteral("abc")) << 0;
+    QTest::newRow("inf") << QVariant(QStringLiteral("inf")) << 0;
+    QTest::newRow("nan") << QVariant(QStringLiteral("nan")) << 0;
+    QTest::newRow("grouped") << QVariant(QStringLiteral("1,234")) << 1234;
     QTest::newRow("digits then text") << QVariant(QStringLiteral("12abc")) << 0;
     QTest::newRow("blank") << QVariant(QStringLiteral("   ")) << 0;
     QTest::newRow("empty text") << QVariant(QString()) << 0;
