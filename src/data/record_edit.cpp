@@ -10,10 +10,6 @@
 namespace zv {
 namespace {
 
-QString WithLine(const QString& tag, const VbError& e) {
-    return FormatWithLine(tag, e);
-}
-
 // The key as a 32-bit number; a value that is no number (Null, text) counts as 0.
 int32_t KeyNumber(const QVariant& v) {
     try {
@@ -53,7 +49,7 @@ void Reposition(Recordset& rs, const QString& keyName, int32_t keyBefore) {
 }  // namespace
 
 void GAddNew(Recordset* rs) {
-    Step([](const VbError& e) { return WithLine(QStringLiteral("GAddNew"), e); },
+    Step([](const VbError& e) { return FormatWithLine(QStringLiteral("GAddNew"), e); },
          [rs] {
              if (!rs) {
                  return;
@@ -72,7 +68,7 @@ void GAddNew(Recordset* rs) {
 }
 
 void GEdit(Recordset* rs) {
-    Step([](const VbError& e) { return WithLine(QStringLiteral("GEdit"), e); },
+    Step([](const VbError& e) { return FormatWithLine(QStringLiteral("GEdit"), e); },
          [rs] {
              if (!rs || rs->IsServer()) {
                  return;
@@ -114,14 +110,14 @@ long GUpdate(int16_t mDb, Recordset* rs) {
             e.Number() == err::JetDuplicate || e.Number() == err::ServerIntegrity;
         const QString tail = QStringLiteral("mDb=") + QString::number(mDb);
         if (IsDevelopmentRun()) {
-            QString text = QStringLiteral("Programr : ") + WithLine(QStringLiteral("GUpdate"), e) +
-                           QLatin1Char('\n');
+            QString text = QStringLiteral("Programr : ") +
+                           FormatWithLine(QStringLiteral("GUpdate"), e) + QLatin1Char('\n');
             if (!server) {
                 text += rs->Name() + QLatin1Char('\n');
             }
             MsgBox(text + tail, vbOKOnly);
         } else if (!duplicate) {
-            MsgBox(WithLine(QStringLiteral("GUpdate"), e) + QLatin1Char('\n') +
+            MsgBox(FormatWithLine(QStringLiteral("GUpdate"), e) + QLatin1Char('\n') +
                        (server ? rs->Source() : rs->Name()) + QLatin1Char('\n') + tail,
                    vbOKOnly);
         }

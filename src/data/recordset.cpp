@@ -67,7 +67,8 @@ struct Recordset::Impl {
     // Filled on the first edit or key lookup.
     bool tableRead = false;
     QString table;
-    QStringList keyFields;  // primary-key columns, named as in fields
+    QStringList keyFields;   // the table's key columns, named as in fields
+    bool updatable = false;  // one table, and every field is a column of it
 
     void RequireOpen() const {
         if (!open) {
@@ -127,6 +128,11 @@ struct Recordset::Impl {
         if (table.isEmpty()) {
             return;
         }
+        const QSqlRecord columns = conn->Db().driver()->record(conn->CatalogueName(table));
+        updatable = true;
+        for (const QString& f : fields) {
+            updatable = updatable && columns.contains(f);
+        }
         const QStringList keys = conn->KeyColumns(table);
         for (const QString& f : fields) {
             if (keys.contains(f, Qt::CaseInsensitive)) {
@@ -139,20 +145,9 @@ struct Recordset::Impl {
         }
     }
 
-    // A dynaset on one table whose columns all belong to it.
     void RequireUpdatable() {
-        if (kind == DbKind::File && type == dbOpenSnapshot) {
-            throw MakeError(err::JetReadOnly);
-        }
         ReadTable();
-        bool ok = !table.isEmpty();
-        if (ok) {
-            const QSqlRecord columns = conn->Db().driver()->record(conn->CatalogueName(table));
-            for (const QString& f : fields) {
-                ok = ok && columns.contains(f);
-            }
-        }
-        if (!ok) {
+        if ((kind == DbKind::File && type == dbOpenSnapshot) || !updatable) {
             throw MakeError(err::JetReadOnly);
         }
     }
@@ -511,6 +506,7 @@ void Recordset::SetSource(const QString& sql) {
     d_->tableRead = false;
     d_->table.clear();
     d_->keyFields.clear();
+    d_->updatable = false;
 }
 
 void Recordset::Requery() {
