@@ -161,7 +161,7 @@ void TestFileDatabase::jetTexts_data() {
     QTest::addColumn<QString>("sql");
     QTest::addColumn<QString>("field");
     QTest::addColumn<QStringList>("expected");
-    QTest::newRow("WHERE FALSE") << "DOCS"
+    QTest::newRow("WHERE FALSE") << "BM"
                                  << "SELECT * FROM UMEMO WHERE FALSE"
                                  << "ID" << QStringList{};
     QTest::newRow("[SHOW]=True") << "OFFICE"
@@ -171,7 +171,7 @@ void TestFileDatabase::jetTexts_data() {
         << "MADAD"
         << "SELECT * FROM [TRANS_CODE] WHERE [TABLE_NUM]=\"1080\" ORDER BY Val([KOD_NUM_1]);"
         << "Teur" << QStringList{"a", "b", "c"};
-    QTest::newRow("max(ID)") << "DOCS"
+    QTest::newRow("max(ID)") << "MDOCS"
                              << "SELECT max(ID) FROM [DOCS]"
                              << "max(ID)" << QStringList{"12"};
     QTest::newRow("client by number") << "OFFICE"
@@ -193,7 +193,7 @@ void TestFileDatabase::jetTexts_data() {
     QTest::newRow("MSql row") << "MAIN"
                               << "SELECT * FROM MSql Where [ClientID]='23'"
                               << "ClientID" << QStringList{"23"};
-    QTest::newRow("DOCS by path, no case") << "DOCS"
+    QTest::newRow("DOCS by path, no case") << "MDOCS"
                                            << "SELECT * FROM DOCS WHERE [FullName]='\\docs\\B.DOC'"
                                            << "ID" << QStringList{"12"};
 }
@@ -203,9 +203,7 @@ void TestFileDatabase::jetTexts() {
     QFETCH(QString, sql);
     QFETCH(QString, field);
     QFETCH(QStringList, expected);
-    const QString file =
-        db == QLatin1String("DOCS") ? (sql.contains(QLatin1String("UMEMO")) ? "BM" : "MDOCS") : db;
-    auto d = Database::Open(file, false);
+    auto d = Database::Open(db, false);
     auto rs = d->OpenRecordset(sql, dbOpenSnapshot);
     QVERIFY(rs->HasField(field));
     QCOMPARE(Column(*rs, field), expected);
