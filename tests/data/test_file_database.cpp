@@ -6,6 +6,7 @@
 #include <QFile>
 #include <QSqlDatabase>
 #include <QtTest>
+#include <thread>
 
 #include "data/data_errors.h"
 #include "data/database.h"
@@ -60,6 +61,7 @@ class TestFileDatabase : public QObject {
     void jetVal();
     void booleansAndDates();
     void duplicateIs3022();
+    void writerWaitsForAShortLock();
     void lockedPastTimeoutIs3260();
     void navigation();
     void editingRules();
@@ -339,6 +341,27 @@ void TestFileDatabase::duplicateIs3022() {
     rs->SetValue(QStringLiteral("ID"), 13);
     rs->Update();
     QCOMPARE(test::QueryFileDb(main_, "MDOCS", "SELECT count(*) FROM DOCS"), QStringLiteral("3"));
+}
+
+void TestFileDatabase::writerWaitsForAShortLock() {
+    sqlite3* other = nullptr;
+    QCOMPARE(sqlite3_open((main_ + "/MDOCS.MDB").toUtf8().constData(), &other), SQLITE_OK);
+    QCOMPARE(sqlite3_exec(other, "BEGIN EXCLUSIVE", nullptr, nullptr, nullptr), SQLITE_OK);
+    // Another writer holds the file for a moment, as another filing process would.
+    std::thread holder([other] {
+        std::this_thread::sleep_for(std::chrono::milliseconds(400));
+        sqlite3_exec(other, "UPDATE DOCS SET Teur='first' WHERE ID=12; COMMIT", nullptr, nullptr,
+                     nullptr);
+    });
+    const long error = ErrorOf([] {
+        auto db = Database::OpenFile(QStringLiteral("\\MDOCS.MDB"));
+        db->Execute(QStringLiteral("UPDATE DOCS SET Teur='second' WHERE ID=7"));
+    });
+    holder.join();
+    sqlite3_close(other);
+    QCOMPARE(error, 0L);
+    QCOMPARE(test::QueryFileDb(main_, "MDOCS", "SELECT group_concat(Teur) FROM DOCS"),
+             QStringLiteral("second,first"));
 }
 
 void TestFileDatabase::lockedPastTimeoutIs3260() {
