@@ -7,8 +7,9 @@
 //
 // The events of the editor are relayed as signals with by-reference arguments; connect
 // them directly (the default for objects of one thread) so that a handler's change of
-// KeyAscii, KeyCode or Restore reaches the editor. Sizes in the layout rules are twips,
-// 15 to a pixel.
+// KeyAscii, KeyCode or Restore reaches the editor. KeyPress comes for printable characters
+// only. In a Designer form, set the properties below as dynamic ones (stdset="0") so that
+// they go through their setters. Sizes in the layout rules are twips, 15 to a pixel.
 
 #include <QColor>
 #include <QDate>
