@@ -4,6 +4,7 @@
 #include <QFile>
 #include <QSqlDatabase>
 #include <QUuid>
+#include <future>
 #include <stdexcept>
 
 #include "sample_install/sample_data.h"
@@ -39,7 +40,8 @@ void CreateFileDatabase(const QString& path, const QString& database, const QStr
             throw std::runtime_error("cannot create " + path.toStdString());
         // The file is new: a crash leaves a file to delete, nothing to recover.
         ExecOrThrow(db, QStringLiteral("PRAGMA synchronous=OFF"));
-        BuildDatabase(db, database, schema, data);
+        for (const QString& index : LoadDatabase(db, database, schema, data))
+            ExecOrThrow(db, index);
         db.close();
     }
     QSqlDatabase::removeDatabase(connection);
@@ -67,13 +69,19 @@ void CreateSampleInstallation(const QString& dir, const SampleOptions& options) 
         MakeFolder(root.filePath(QStringLiteral("DOCS/DOCBASIC/") + inner));
 
     const SampleData data(options);
+    // The server loads while the files are written.
+    std::future<void> server;
+    if (!options.serverDataSource.isEmpty()) {
+        server = std::async(std::launch::async,
+                            [&options, &data] { CreateServerDatabases(options, data); });
+    }
     const QList<SchemaSection> schema = LoadSchema(QStringLiteral("sqlite"));
     for (const QString& name : FileDatabaseNames()) {
         CreateFileDatabase(root.filePath(name + QStringLiteral(".MDB")), name,
                            SchemaStatements(schema, name), data);
     }
-    if (!options.serverDataSource.isEmpty()) {
-        CreateServerDatabases(options, data);
+    if (server.valid()) {
+        server.get();
         WriteServerSettingsFile(root.path(), options);
     }
     if (options.writeSettings)

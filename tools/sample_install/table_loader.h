@@ -13,9 +13,10 @@ namespace zv {
 // Runs one statement; a failure throws std::runtime_error naming the statement.
 void ExecOrThrow(QSqlDatabase& db, const QString& sql);
 
-// Creates the tables of a database, loads its sample rows in one transaction with
-// multi-row prepared INSERTs, then creates the indexes.
-void BuildDatabase(QSqlDatabase& db, const QString& database, const QStringList& schema,
-                   const SampleData& data);
+// Creates the tables of a database and loads its sample rows, in one transaction with
+// multi-row prepared INSERTs. Returns the index statements of the schema, left for the
+// caller to run afterwards: building an index on loaded rows is much faster.
+QStringList LoadDatabase(QSqlDatabase& db, const QString& database, const QStringList& schema,
+                         const SampleData& data);
 
 }  // namespace zv
