@@ -16,8 +16,6 @@
 
 using namespace zv;
 
-Q_DECLARE_METATYPE(QVariantList)
-
 namespace {
 
 const QString kComplete = QStringLiteral(

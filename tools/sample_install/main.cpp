@@ -5,6 +5,7 @@
 #include <QCoreApplication>
 #include <QElapsedTimer>
 #include <cstdio>
+#include <cstdlib>
 #include <exception>
 
 #include "sample_install/sample_install.h"
