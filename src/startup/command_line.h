@@ -5,6 +5,8 @@
 #include <QString>
 #include <QStringList>
 
+#include "startup/filing_options.h"
+
 namespace zv {
 
 struct CommandLine {
@@ -12,6 +14,7 @@ struct CommandLine {
     bool help = false;     // --help
     bool version = false;  // --version
     QString error;         // a usage error, for example an unknown option
+    FilingOptions filing;  // what --batch files, in place of the dialog
     // The arguments after the options, joined with single spaces, as bytes.
     QByteArray request;
 };
