@@ -194,7 +194,7 @@ void TestSampleInstall::sampleRowsCoverTheCases_data() {
         << "OFFICE"
         << "SELECT group_concat(CODE || ':' || n) FROM (SELECT CODE, count(*) n FROM OFF_CODE "
            "WHERE CODE IN (20,21) GROUP BY CODE)"
-        << "20:6,21:4";
+        << "20:6,21:5";
     QTest::newRow("origins 1080 as text, 10 of them")
         << "MADAD"
         << "SELECT count(*) FROM TRANS_CODE WHERE TABLE_NUM='1080' AND KOD_NUM_1 BETWEEN '1' AND "

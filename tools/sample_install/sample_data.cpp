@@ -193,7 +193,8 @@ void SampleData::Rows(const QString& table, const RowSink& sink) const {
         for (const char* teur : {"מכתב", "חוזה", "כתב תביעה", "כתב הגנה", "פסק דין", "חשבונית"})
             Row(sink, {20, ++num, Text(teur)});
         num = 0;
-        for (const char* teur : {"מקור", "העתק", "טיוטה", "סרוק"})
+        // Quotes and a backslash as users type them.
+        for (const char* teur : {"מקור", "העתק", "טיוטה", "סרוק", "העתק \"נאמן למקור\" \\ סרוק"})
             Row(sink, {21, ++num, Text(teur)});
         Row(sink, {5, 1, Text("סניף ראשי")});
     } else if (table == QLatin1String("CLIENT")) {
