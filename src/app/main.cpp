@@ -8,6 +8,9 @@
 #include <cstdio>
 #include <memory>
 
+#include "filing/batch_filing.h"
+#include "filing/work_with_str.h"
+#include "startup/backend_selection.h"
 #include "startup/command_line.h"
 #include "startup/main_entry.h"
 #include "startup/request_text.h"
@@ -58,8 +61,15 @@ void PrepareHebrewUi(QApplication& app) {
     }
 }
 
-// Handles a request that passed Main's checks.
-void HandleFilingRequest(int& /*mode*/, QString& /*path*/, QString& /*name*/) {}
+// Handles a request that passed Main's checks: the back-ends, then the filing, with the
+// dialog or from the batch options. Returns the archived file's path, empty when nothing
+// was filed.
+QString HandleFilingRequest(const zv::CommandLine& cl, int mode, const QString& path,
+                            const QString& name) {
+    zv::GetMSSQLParam();
+    return cl.batch ? zv::FileWithoutWindow(mode, path, name, cl.filing)
+                    : zv::WorkWithStr(mode, path, name);
+}
 
 }  // namespace
 
@@ -91,5 +101,17 @@ int main(int argc, char** argv) {
     } else {
         zv::SetUi(std::make_unique<zv::QtUi>());
     }
-    return zv::Main(zv::DecodeArgumentText(cl.request), HandleFilingRequest);
+    QString archived;
+    const int status =
+        zv::Main(zv::DecodeArgumentText(cl.request), [&](int& mode, QString& path, QString& name) {
+            archived = HandleFilingRequest(cl, mode, path, name);
+        });
+    if (!cl.batch || status != 0) {
+        return status;
+    }
+    if (archived.isEmpty()) {
+        return 1;
+    }
+    Print(stdout, archived + QStringLiteral("\n"));
+    return 0;
 }

@@ -25,15 +25,16 @@ void TestCommandLine::options_data() {
     using L = QList<QByteArray>;
     QTest::newRow("request only") << L{"1\xC2\xA5/t/a.doc\xC2\xA5x"} << false << false << false
                                   << QByteArray("1\xC2\xA5/t/a.doc\xC2\xA5x");
-    QTest::newRow("batch") << L{"--batch", ""} << true << false << false << QByteArray();
+    QTest::newRow("batch") << L{"--batch", "--client", "1001", ""} << true << false << false
+                           << QByteArray();
     QTest::newRow("nothing") << L{} << false << false << false << QByteArray();
     QTest::newRow("split request joined")
-        << L{"--batch", "1\xA5/t/my", "file.doc\xA5x"} << true << false << false
+        << L{"--batch", "--client", "1001", "1\xA5/t/my", "file.doc\xA5x"} << true << false << false
         << QByteArray("1\xA5/t/my file.doc\xA5x");
     QTest::newRow("options end at the request") << L{"1\xA5p\xA5n", "--batch"} << false << false
                                                 << false << QByteArray("1\xA5p\xA5n --batch");
-    QTest::newRow("double dash") << L{"--batch", "--", "-1\xA5p\xA5n"} << true << false << false
-                                 << QByteArray("-1\xA5p\xA5n");
+    QTest::newRow("double dash") << L{"--batch", "--client", "1001", "--", "-1\xA5p\xA5n"} << true
+                                 << false << false << QByteArray("-1\xA5p\xA5n");
     QTest::newRow("help") << L{"--help"} << false << true << false << QByteArray();
     QTest::newRow("unknown option") << L{"--bogus", "x"} << false << false << true << QByteArray();
     QTest::newRow("single-dash unknown") << L{"-x"} << false << false << true << QByteArray();

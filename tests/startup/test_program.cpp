@@ -91,7 +91,7 @@ void TestProgram::refusals() {
         test::MakeInstallation(env, setup == 2);
     }
     expected.replace(QStringLiteral("%M"), env.DataDir());
-    const Result r = RunProgram({"--batch", request}, env);
+    const Result r = RunProgram({"--batch", "--client", "1001", request}, env);
     QCOMPARE(r.status, 1);
     QVERIFY2(r.err.endsWith(expected), qPrintable(r.err));
 }
@@ -99,11 +99,13 @@ void TestProgram::refusals() {
 void TestProgram::handledRequestPreparesWorkFolders() {
     test::TestEnv env;
     const test::Installation inst = test::MakeInstallation(env);
-    const Result r = RunProgram({"--batch", "1\xC2\xA5" + inst.document.toUtf8() +
-                                                "\xC2\xA5"
-                                                "Letter"},
+    const Result r = RunProgram({"--batch", "--client", "1001",
+                                 "1\xC2\xA5" + inst.document.toUtf8() +
+                                     "\xC2\xA5"
+                                     "Letter"},
                                 env);
-    QCOMPARE(r.status, 0);
+    // Handled, not filed: this installation has no client databases.
+    QCOMPARE(r.status, 1);
     QVERIFY2(!r.err.contains(QStringLiteral("שרות")), qPrintable(r.err));
     QStringList folders =
         QDir(inst.mainPath + QStringLiteral("/Dat1")).entryList(QDir::Dirs | QDir::NoDotAndDotDot);
@@ -121,8 +123,9 @@ void TestProgram::windows1255Request() {
     const QByteArray request = cp1255.encode(QStringLiteral("2¥") + hebrewDoc + "¥נושא");
     QVERIFY(request.contains('\xA5'));
     // The file's name on disk is UTF-8, so a path decoded from Windows-1255 must match it.
-    const Result r = RunProgram({"--batch", request}, env);
-    QCOMPARE(r.status, 0);
+    const Result r = RunProgram({"--batch", "--client", "1001", request}, env);
+    QCOMPARE(r.status, 1);
+    QVERIFY2(!r.err.contains(QStringLiteral("שרות")), qPrintable(r.err));
 }
 
 void TestProgram::options_data() {
