@@ -7,6 +7,7 @@
 #include "filing_dialog/case_kinds.h"
 #include "filing_dialog/file_naming.h"
 #include "filing_dialog/name_guard.h"
+#include "startup/backend_selection.h"
 #include "startup/settings.h"
 #include "ui/font_fix.h"
 #include "ui_frm_get_doc_det.h"
@@ -101,6 +102,7 @@ void FrmGetDocDet::LoadSteps() {
                                     QString::fromLatin1(key), QString()));
         }
     });
+    Step(report, [&] { GetMSSQLParam(); });
     Step(report, [&] {
         if (IsFileExist(MainPath() + QStringLiteral("/GDetDef/LB81.") + MyUser())) {
             for (QWidget* w : findChildren<QWidget*>()) {

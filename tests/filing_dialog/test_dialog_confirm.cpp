@@ -1,0 +1,419 @@
+// Confirming the filing dialog, the creation-date unlock, the reminder fields, the input
+// filters and the keyboard.
+
+#include <QCheckBox>
+#include <QClipboard>
+#include <QComboBox>
+#include <QDir>
+#include <QFile>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMimeData>
+#include <QPushButton>
+
+#include "controls/date_box.h"
+#include "controls/gdate.h"
+#include "dialog_fixture.h"
+#include "dialogs/frm_get_password.h"
+#include "filing_dialog/name_guard.h"
+#include "util/keyboard_layout.h"
+
+using namespace zv;
+using zv::test::DialogFixture;
+
+namespace {
+
+void Type(QWidget& w, QChar c) {
+    QTest::sendKeyEvent(QTest::Click, &w, Qt::Key_unknown, QString(c), Qt::NoModifier);
+}
+
+// A keyboard that remembers the layout it was asked for.
+class RecordingKeyboard : public KeyboardPlatform {
+  public:
+    QString ActiveLayoutName() override { return active_; }
+    void LoadLayout(const QString& layoutId) override { active_ = layoutId; }
+
+  private:
+    QString active_ = QStringLiteral("00000409");
+};
+
+}  // namespace
+
+class TestDialogConfirm : public QObject {
+    Q_OBJECT
+
+  private slots:
+    void noClientFirst_data() {
+        QTest::addColumn<QString>("name");
+        QTest::newRow("with a name") << "מכתב";
+        QTest::newRow("without a name") << "";
+    }
+    void noClientFirst() {
+        QFETCH(QString, name);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load([&](FrmGetDocDet& d) {
+            d.SetDefultName(name);
+            d.SetIsCaptureMail(true);
+        });
+        d.show();
+        f.Child<QPushButton>("CmdOK").click();
+        QCOMPARE(f.Ui().Texts(),
+                 QStringList{QStringLiteral("חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך")});
+        QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
+        QVERIFY(d.isVisible());
+    }
+
+    void noFileName() {
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load([](FrmGetDocDet& d) {
+            d.SetDefultName({});
+            d.SetIsCaptureMail(true);
+        });
+        f.Child<QLabel>("LakNum").setText(QStringLiteral("1001"));
+        d.show();
+        f.Child<QPushButton>("CmdOK").click();
+        QCOMPARE(f.Ui().Texts(), QStringList{QStringLiteral("יש לקבוע שם לקובץ הנשמר")});
+        QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
+        QVERIFY(d.isVisible());
+    }
+
+    void existingFile_data() {
+        QTest::addColumn<QString>("existing");  // name of a file in the target folder
+        QTest::addColumn<int>("answer");
+        QTest::addColumn<bool>("asked");
+        QTest::addColumn<bool>("confirmed");
+        QTest::newRow("no") << "מכתב ללקוח" << int(vbNo) << true << false;
+        QTest::newRow("yes") << "מכתב ללקוח" << int(vbYes) << true << true;
+        QTest::newRow("same name with extension") << "מכתב ללקוח.doc" << int(vbNo) << false << true;
+        QTest::newRow("no file") << "" << int(vbNo) << false << true;
+    }
+    void existingFile() {
+        QFETCH(QString, existing);
+        QFETCH(int, answer);
+        QFETCH(bool, asked);
+        QFETCH(bool, confirmed);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        f.Child<QLabel>("LakNum").setText(QStringLiteral("1001"));
+        f.Child<QComboBox>("CboTeur").setEditText(QStringLiteral("תיאור חופשי"));
+        const QString target = d.FileNameToSave();
+        if (!existing.isEmpty()) {
+            QFile file(f.Docs() + QStringLiteral("/MAILIN/") + existing);
+            QVERIFY(file.open(QIODevice::WriteOnly));
+        }
+        d.show();
+        f.Ui().QueueAnswer(answer);
+        f.Child<QPushButton>("CmdOK").click();
+        if (asked) {
+            QCOMPARE(f.Ui().Texts(), QStringList{QStringLiteral("קיים קובץ בשם זה האם לשכתבו : ") +
+                                                 QStringLiteral("\r\n") + target});
+            QCOMPARE(f.Ui().Messages().front().style, int(vbQuestion | vbYesNo | vbDefaultButton2));
+        } else {
+            QCOMPARE(f.Ui().Texts(), QStringList());
+        }
+        QCOMPARE(d.isVisible(), !confirmed);
+        QVERIFY(!d.IsCancel());
+        QCOMPARE(d.FileNameToSave(), target);
+        QCOMPARE(d.Details().description, QStringLiteral("תיאור חופשי"));
+    }
+
+    void details() {
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load([](FrmGetDocDet& d) { d.SetPartOf(5); });
+        f.Child<QLabel>("LakNum").setText(QStringLiteral("5"));
+        f.Child<QLabel>("LblSug").setText(QStringLiteral("H"));
+        f.Child<QLabel>("LSugTik").setText(QStringLiteral("4"));
+        f.Child<QLabel>("LTik").setText(QStringLiteral("9"));
+        f.Child<QLabel>("LTikNum").setText(QStringLiteral("9-1"));
+        f.Child<QComboBox>("CboSecTeur").setCurrentIndex(1);
+        f.Child<QLineEdit>("TxtRemark").setText(QStringLiteral("הערה"));
+        f.Child<QCheckBox>("ChkIsMemo").click();
+        f.Child<QCheckBox>("ChkIsJumpMemo").click();
+        f.Child<GDate>("TDateMemo").SetValue(QDate(2026, 4, 1));
+        d.show();
+        f.Child<QPushButton>("CmdOK").click();
+        QVERIFY(!d.isVisible());
+        const DocDetails v = d.Details();
+        QCOMPARE(v.handlers, QStringLiteral("דנה כהן"));
+        QCOMPARE(v.moreDescription, QStringLiteral("העתק"));
+        QCOMPARE(v.remark, QStringLiteral("הערה"));
+        QVERIFY(v.reminder);
+        QVERIFY(v.popup);
+        QCOMPARE(v.reminderDate, QDate(2026, 4, 1));
+        QCOMPARE(v.reminderTime, QStringLiteral("08:00"));
+        QCOMPARE(v.receivedDate, QDate(2026, 3, 17));
+        QCOMPARE(v.createdDate, QDate(2026, 3, 17));
+        QVERIFY(!v.createdUnlocked);
+        QCOMPARE(v.origin, std::optional<int>(5));
+        QCOMPARE(v.status, std::optional<int>(2));
+        QCOMPARE(v.clientNumber, QStringLiteral("5"));
+        QCOMPARE(v.kindLetter, QStringLiteral("H"));
+        QCOMPARE(v.subKind, QStringLiteral("4"));
+        QCOMPARE(v.caseNumber, QStringLiteral("9"));
+        QCOMPARE(v.caseCode, QStringLiteral("9-1"));
+    }
+
+    void unlockCreationDate_data() {
+        QTest::addColumn<QString>("code");  // "-": the prompt is closed
+        QTest::addColumn<bool>("unlocked");
+        QTest::newRow("right code") << "5382" << true;
+        QTest::newRow("wrong code") << "1234" << false;
+        QTest::newRow("code with more") << "53820" << false;
+        QTest::newRow("cancelled") << "-" << false;
+    }
+    void unlockCreationDate() {
+        QFETCH(QString, code);
+        QFETCH(bool, unlocked);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        d.show();
+        QString prompt;
+        f.Ui().QueueModal([&](QWidget& w) {
+            auto& p = dynamic_cast<FrmGetPassword&>(w);
+            prompt = p.Label1().text();
+            QCOMPARE(p.Text1().echoMode(), QLineEdit::Password);
+            if (code == QLatin1String("-")) {
+                p.Text1().setText(QStringLiteral("5382"));
+                p.close();
+            } else {
+                p.Text1().setText(code);
+                p.Command1().click();
+            }
+        });
+        f.Child<QPushButton>("Command3").click();
+        QCOMPARE(prompt, QStringLiteral("קלוט סיסמא לשינוי תאריך היצירה"));
+        QCOMPARE(f.Child<GDate>("TDate").Enabled(), unlocked);
+        QCOMPARE(d.Details().createdUnlocked, unlocked);
+        if (unlocked) {
+            QCOMPARE(f.Ui().Texts(),
+                     QStringList{QStringLiteral("ניתן כעת לערוך את תאריך יצירה ולשמור")});
+            QCOMPARE(f.Ui().Messages().front().style, int(vbExclamation));
+        } else {
+            QCOMPARE(f.Ui().Texts(), QStringList());
+        }
+        QCOMPARE(f.Ui().UnexpectedModals(), 0);
+    }
+
+    void currentTimeAndReminder() {
+        DialogFixture f;
+        f.Load();
+        auto& now = f.Child<QPushButton>("CmdNow");
+        now.click();
+        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), QStringLiteral("14:05"));
+        QVERIFY(!now.isChecked());
+
+        auto& memo = f.Child<QCheckBox>("ChkIsMemo");
+        auto& popup = f.Child<QCheckBox>("ChkIsJumpMemo");
+        QVERIFY(!popup.isEnabled());
+        memo.click();
+        QVERIFY(popup.isEnabled());
+        popup.click();
+        memo.click();
+        QVERIFY(!popup.isEnabled());
+        QVERIFY(popup.isChecked());
+    }
+
+    void inputFilters_data() {
+        QTest::addColumn<QString>("control");
+        QTest::addColumn<QString>("typed");
+        QTest::addColumn<bool>("changes");
+        QTest::newRow("date: letter") << "TDate"
+                                      << "a" << false;
+        QTest::newRow("date: space") << "TDateRecieved"
+                                     << " " << false;
+        QTest::newRow("date: digit") << "TDateMemo"
+                                     << "3" << true;
+        QTest::newRow("time: letter") << "TDBTime1"
+                                      << "a" << false;
+        QTest::newRow("time: space") << "TDBTime1"
+                                     << " " << false;
+        QTest::newRow("time: backspace") << "TDBTime1"
+                                         << "\b" << false;
+        QTest::newRow("time: slash") << "TDBTime1"
+                                     << "/" << false;
+        QTest::newRow("time: digit") << "TDBTime1"
+                                     << "9" << true;
+        QTest::newRow("time: colon") << "TDBTime1"
+                                     << ":" << true;
+    }
+    void inputFilters() {
+        QFETCH(QString, control);
+        QFETCH(QString, typed);
+        QFETCH(bool, changes);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        f.Child<GDate>("TDate").SetEnabled(true);
+        QLineEdit* edit = control == QLatin1String("TDBTime1")
+                              ? &f.Child<QLineEdit>("TDBTime1")
+                              : &f.Child<GDate>(qPrintable(control)).TDBDate1().Edit();
+        edit->setFocus();
+        edit->setCursorPosition(edit->text().size());
+        const QString before = edit->text();
+        // A refused character never reaches the date box, so it does not count as invalid
+        // input there either.
+        int invalid = 0;
+        if (control != QLatin1String("TDBTime1")) {
+            connect(&f.Child<GDate>(qPrintable(control)), &GDate::InvalidInput, this,
+                    [&] { ++invalid; });
+        }
+        if (typed == QLatin1String("\b")) {
+            QTest::sendKeyEvent(QTest::Click, edit, Qt::Key_Backspace, typed, Qt::NoModifier);
+        } else {
+            edit->selectAll();
+            Type(*edit, typed.front());
+        }
+        QCOMPARE(edit->text() != before, changes);
+        QCOMPARE(invalid, 0);
+        // Keys without a character pass the filters.
+        edit->setCursorPosition(0);
+        QTest::keyClick(edit, Qt::Key_Right);
+        QCOMPARE(edit->cursorPosition(), 1);
+    }
+
+    void forbiddenNameChars_data() {
+        QTest::addColumn<QString>("how");
+        QTest::addColumn<QString>("input");
+        QTest::newRow("typed colon") << "type"
+                                     << ":";
+        QTest::newRow("typed backslash") << "type"
+                                         << "\\";
+        QTest::newRow("typed slash") << "type"
+                                     << "/";
+        QTest::newRow("pasted path") << "paste"
+                                     << "..\\..\\x";
+        QTest::newRow("pasted slash") << "paste"
+                                      << "a/b";
+        QTest::newRow("dropped colon") << "drop"
+                                       << "c:x";
+        QTest::newRow("dropped quote") << "drop"
+                                       << "a\"b";
+    }
+    void forbiddenNameChars() {
+        QFETCH(QString, how);
+        QFETCH(QString, input);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        auto& name = f.Child<QLineEdit>("TxtTeur");
+        name.setFocus();
+        name.setCursorPosition(2);
+        const QString before = name.text();
+        const QString target = d.FileNameToSave();
+        if (how == QLatin1String("type")) {
+            Type(name, input.front());
+        } else if (how == QLatin1String("paste")) {
+            QApplication::clipboard()->setText(input);
+            QTest::keyClick(&name, Qt::Key_V, Qt::ControlModifier);
+        } else {
+            auto* mime = new QMimeData;
+            mime->setText(input);
+            const QPoint at = name.rect().center();
+            QDragEnterEvent enter(at, Qt::CopyAction, mime, Qt::LeftButton, Qt::NoModifier);
+            QApplication::sendEvent(&name, &enter);
+            QDropEvent drop(at, Qt::CopyAction, mime, Qt::LeftButton, Qt::NoModifier);
+            QApplication::sendEvent(&name, &drop);
+            delete mime;
+        }
+        QCOMPARE(name.text(), before);
+        QCOMPARE(f.Ui().Texts(), QStringList{ForbiddenNameMessage()});
+        QCOMPARE(ForbiddenNameMessage(),
+                 QStringLiteral("אסור לקלוט כחלק משם קובץ את התווים הבאים : /\\:*?\"<>|"));
+        QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
+        QCOMPARE(d.FileNameToSave(), target);
+        // Allowed text still goes in the same way.
+        f.Ui().Clear();
+        if (how == QLatin1String("paste")) {
+            QApplication::clipboard()->setText(QStringLiteral("-2"));
+            QTest::keyClick(&name, Qt::Key_V, Qt::ControlModifier);
+        } else {
+            name.end(false);
+            Type(name, QLatin1Char('7'));
+        }
+        QVERIFY(name.text() != before);
+        QCOMPARE(f.Ui().Texts(), QStringList());
+        QCOMPARE(d.FileNameToSave(), d.DirToSave() + name.text());
+    }
+
+    void hebrewKeyboardOnFocus_data() {
+        QTest::addColumn<QString>("control");
+        QTest::addColumn<QString>("layout");
+        QTest::newRow("name") << "TxtTeur"
+                              << "0000040D";
+        QTest::newRow("remark") << "TxtRemark"
+                                << "0000040D";
+        QTest::newRow("time") << "TDBTime1"
+                              << "00000409";
+    }
+    void hebrewKeyboardOnFocus() {
+        QFETCH(QString, control);
+        QFETCH(QString, layout);
+        DialogFixture f;
+        auto previous = SetKeyboardPlatform(std::make_unique<RecordingKeyboard>());
+        FrmGetDocDet& d = f.Load();
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        d.activateWindow();
+        f.Child<QPushButton>("CmdLak").setFocus();
+        f.Child<QLineEdit>(qPrintable(control)).setFocus();
+        QTRY_VERIFY(f.Child<QLineEdit>(qPrintable(control)).hasFocus());
+        QCOMPARE(CurrentKeyboardPlatform().ActiveLayoutName(), layout);
+        SetKeyboardPlatform(std::move(previous));
+    }
+
+    void keyboardOrder() {
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        f.Child<QWidget>("FolderView1").show();
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        QVERIFY(f.Child<QPushButton>("CmdOK").isDefault());
+        // Each control of the tab chain follows the one before it in reading order: further
+        // left on the same line, or on a lower line; the chain starts again at the top of the
+        // folder column, left of the properties.
+        QWidget* w = &f.Child<QWidget>("CmdLak");
+        QWidget* start = w;
+        QStringList chain;
+        QRect prev;
+        int columnBreaks = 0;
+        do {
+            // A date box counts once, however many parts of it take the focus.
+            QWidget* stop = w;
+            for (QWidget* p = w; p && p != &d; p = p->parentWidget()) {
+                if (p->inherits("zv::GDate")) {
+                    stop = p;
+                }
+            }
+            const bool again = !chain.isEmpty() && chain.last() == stop->objectName();
+            if (!again && w->isVisibleTo(&d) && w->isEnabled() &&
+                (w->focusPolicy() & Qt::TabFocus) && !stop->objectName().isEmpty() &&
+                !w->objectName().startsWith(QLatin1String("qt_"))) {
+                const QRect r(stop->mapTo(&d, QPoint(0, 0)), stop->size());
+                if (!prev.isNull()) {
+                    const bool sameLine = r.top() < prev.bottom() && r.bottom() > prev.top();
+                    const bool below = r.top() >= prev.center().y();
+                    const bool leftOf = r.center().x() < prev.center().x();
+                    const bool newColumn =
+                        !sameLine && r.right() < prev.left() && r.top() < prev.top();
+                    columnBreaks += newColumn ? 1 : 0;
+                    QVERIFY2((sameLine && leftOf) || below || newColumn,
+                             qPrintable(chain.last() + " -> " + stop->objectName()));
+                }
+                chain << stop->objectName();
+                prev = r;
+            }
+            w = w->nextInFocusChain();
+        } while (w != start && chain.size() < 100);
+        QCOMPARE(columnBreaks, 1);
+        for (const char* name :
+             {"TxtTeur", "CboStatus", "TDateRecieved", "TDBTime1", "FolderView1", "CmdOK"}) {
+            QVERIFY2(chain.contains(QLatin1String(name)), name);
+        }
+        QCOMPARE(chain.last(), QStringLiteral("CmdOK"));
+    }
+};
+
+QTEST_MAIN(TestDialogConfirm)
+#include "test_dialog_confirm.moc"

@@ -1,0 +1,329 @@
+// The filing dialog as it opens on a sample installation: lists, defaults, folder view,
+// catalogue, and how it ends.
+
+#include <QComboBox>
+#include <QDir>
+#include <QLabel>
+#include <QLineEdit>
+#include <QSet>
+
+#include "controls/gdate.h"
+#include "dialog_fixture.h"
+#include "filing_dialog/folder_view.h"
+
+using namespace zv;
+using zv::test::DialogFixture;
+
+namespace {
+
+QStringList Texts(const QComboBox& box) {
+    QStringList out;
+    for (int i = 0; i < box.count(); ++i) {
+        out << box.itemText(i);
+    }
+    return out;
+}
+
+QList<int> Data(const QComboBox& box) {
+    QList<int> out;
+    for (int i = 0; i < box.count(); ++i) {
+        out << box.itemData(i).toInt();
+    }
+    return out;
+}
+
+// Code tables of known content, written out of order and with blanks around the texts.
+void SetCodeRows(DialogFixture& f) {
+    f.Exec(QStringLiteral("OFFICE"), QStringLiteral("DELETE FROM OFF_CODE"));
+    f.Exec(QStringLiteral("OFFICE"),
+           QStringLiteral("INSERT INTO OFF_CODE (CODE, NUM, Teur) VALUES (20, 2, ' חוזה '), "
+                          "(20, 1, 'מכתב'), (20, 10, 'פסק דין'), (21, 1, 'מקור'), "
+                          "(21, 2, 'העתק'), (5, 1, 'סניף')"));
+    f.Exec(QStringLiteral("OFFICE"), QStringLiteral("DELETE FROM MTIK"));
+    f.Exec(
+        QStringLiteral("OFFICE"),
+        QStringLiteral("INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (28, '  תיקי הוצאה לפועל  ', 1), "
+                       "(26, 'תיקי ירושה', 1), (29, 'תיקי ארכיון', 0)"));
+    f.Exec(QStringLiteral("MDOCS"), QStringLiteral("DELETE FROM DOCSTATUS"));
+    f.Exec(QStringLiteral("MDOCS"),
+           QStringLiteral("INSERT INTO DOCSTATUS (ID, Caption, ORD) VALUES (3, 'סגור', 4), "
+                          "(1, 'חדש', 1), (4, ' ממתין לתגובה ', 3), (2, 'בטיפול', 2)"));
+    f.Exec(QStringLiteral("MADAD"), QStringLiteral("DELETE FROM TRANS_CODE"));
+    f.Exec(QStringLiteral("MADAD"),
+           QStringLiteral("INSERT INTO TRANS_CODE (TABLE_NUM, KOD_NUM_1, Teur) VALUES "
+                          "('1080', '10', 'אחר'), ('1080', '9', 'הוצאה לפועל'), "
+                          "('1080', '5', ' סריקה '), ('1080', '1', 'דואר'), "
+                          "('1070', '2', 'טבלה אחרת')"));
+}
+
+}  // namespace
+
+class TestDialogLoad : public QObject {
+    Q_OBJECT
+
+  private slots:
+    void listsAndDefaults() {
+        DialogFixture f;
+        SetCodeRows(f);
+        FrmGetDocDet& d = f.Load();
+        QCOMPARE(f.Ui().Texts(), QStringList());
+
+        QCOMPARE(Texts(f.Child<QComboBox>("CboTeur")), QStringList({"מכתב", "חוזה", "פסק דין"}));
+        QCOMPARE(Texts(f.Child<QComboBox>("CboSecTeur")), QStringList({"מקור", "העתק"}));
+        QCOMPARE(f.Child<QComboBox>("CboTeur").currentText(), QString());
+
+        auto& status = f.Child<QComboBox>("CboStatus");
+        QCOMPARE(Texts(status),
+                 QStringList({"1 - חדש", "2 - בטיפול", "4 - ממתין לתגובה", "3 - סגור"}));
+        QCOMPARE(Data(status), QList<int>({1, 2, 4, 3}));
+        QCOMPARE(d.Status(), int16_t(2));
+        QCOMPARE(status.currentText(), QStringLiteral("2 - בטיפול"));
+
+        auto& origin = f.Child<QComboBox>("CboPartOf");
+        QCOMPARE(Texts(origin),
+                 QStringList({"1 - דואר", "5 - סריקה", "9 - הוצאה לפועל", "10 - אחר"}));
+        QCOMPARE(Data(origin), QList<int>({1, 5, 9, 10}));
+        QCOMPARE(origin.currentIndex(), 0);
+        QVERIFY(origin.isEnabled());
+
+        const QStringList inner = Texts(f.Child<QComboBox>("CboDocBasic"));
+        QCOMPARE(QSet<QString>(inner.begin(), inner.end()),
+                 QSet<QString>(SampleDocBasicFolders().begin(), SampleDocBasicFolders().end()));
+        QCOMPARE(f.Child<QComboBox>("CboDocBasic").currentIndex(), -1);
+
+        QCOMPARE(f.Child<GDate>("TDate").date(), QDate(2026, 3, 17));
+        QCOMPARE(f.Child<GDate>("TDateMemo").date(), QDate(2026, 3, 17));
+        QCOMPARE(f.Child<GDate>("TDateRecieved").date(), QDate(2026, 3, 17));
+        QVERIFY(!f.Child<GDate>("TDate").Enabled());
+        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), QStringLiteral("08:00"));
+        QCOMPARE(f.Child<QLabel>("LPersonal").text(), QStringLiteral("דנה כהן"));
+        QCOMPARE(f.Child<QLabel>("LGlobalNum").text(), QStringLiteral("23/100/1"));
+        QCOMPARE(UserCode(), QStringLiteral("100"));
+
+        auto& name = f.Child<QLineEdit>("TxtTeur");
+        QCOMPARE(name.text(), QStringLiteral("מכתב ללקוח"));
+        QCOMPARE(name.selectedText(), name.text());
+
+        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN");
+        auto& tree = f.Child<FolderView>("FolderView1");
+        QVERIFY(tree.isHidden());
+        QCOMPARE(tree.SelectedPath(), mailIn);
+        QCOMPARE(f.Child<QLabel>("LDir").text(), mailIn);
+        QCOMPARE(d.StartDir(), mailIn);
+        QCOMPARE(d.DirToSave(), mailIn + QLatin1Char('/'));
+        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(f.Child<QLabel>("LFileName").text(), d.FileNameToSave());
+        QVERIFY(!d.IsCancel());
+
+        QCOMPARE(OptKeyNames().size(), 20);
+        QCOMPARE(OptKeyNames().value(QStringLiteral("1026")), QStringLiteral("תיקי ירושה"));
+        QCOMPARE(OptKeyNames().value(QStringLiteral("1028")), QStringLiteral("תיקי הוצאה לפועל"));
+        QVERIFY(!OptKeyNames().contains(QStringLiteral("1029")));
+        QVERIFY(!f.Child<QLabel>("LblSug").isVisibleTo(&d));
+    }
+
+    void presets_data() {
+        QTest::addColumn<int>("status");
+        QTest::addColumn<int>("partOf");
+        QTest::addColumn<QString>("statusText");
+        QTest::addColumn<QString>("originText");
+        QTest::addColumn<bool>("originLocked");
+        QTest::newRow("status 3, origin 5") << 3 << 5 << "3 - סגור"
+                                            << "5 - סריקה" << true;
+        QTest::newRow("origin 10") << 0 << 10 << "2 - בטיפול"
+                                   << "10 - אחר" << true;
+        QTest::newRow("unknown status") << 9 << 0 << ""
+                                        << "1 - דואר" << false;
+        QTest::newRow("unknown origin") << 1 << 99 << "1 - חדש"
+                                        << "" << false;
+        QTest::newRow("negative origin") << 1 << -4 << "1 - חדש"
+                                         << "1 - דואר" << false;
+    }
+    void presets() {
+        QFETCH(int, status);
+        QFETCH(int, partOf);
+        QFETCH(QString, statusText);
+        QFETCH(QString, originText);
+        QFETCH(bool, originLocked);
+        DialogFixture f;
+        SetCodeRows(f);
+        FrmGetDocDet& d = f.Load([&](FrmGetDocDet& d) {
+            d.SetStatus(int16_t(status));
+            d.SetPartOf(int16_t(partOf));
+        });
+        QCOMPARE(d.Status(), int16_t(status == 0 ? 2 : status));
+        QCOMPARE(f.Child<QComboBox>("CboStatus").currentText(), statusText);
+        QCOMPARE(f.Child<QComboBox>("CboPartOf").currentText(), originText);
+        QCOMPARE(!f.Child<QComboBox>("CboPartOf").isEnabled(), originLocked);
+        // The list after the origins fills whatever the origin did.
+        QCOMPARE(f.Child<QComboBox>("CboDocBasic").count(), SampleDocBasicFolders().size());
+        QCOMPARE(d.Details().origin.has_value(), !originText.isEmpty());
+        QCOMPARE(d.Details().status.has_value(), !statusText.isEmpty());
+        QCOMPARE(f.Ui().Texts(), QStringList());
+    }
+
+    void catalogue_data() {
+        QTest::addColumn<QString>("change");
+        QTest::addColumn<int>("messages");
+        QTest::newRow("no user kinds") << "DELETE FROM MTIK" << 0;
+        QTest::newRow("none shown") << "UPDATE MTIK SET SHOW=0" << 0;
+        QTest::newRow("no table") << "DROP TABLE MTIK" << 1;
+    }
+    void catalogue() {
+        QFETCH(QString, change);
+        QFETCH(int, messages);
+        DialogFixture f;
+        f.Exec(QStringLiteral("OFFICE"), change);
+        f.Load();
+        QStringList keys = OptKeyNames().keys();
+        std::sort(keys.begin(), keys.end(),
+                  [](const QString& a, const QString& b) { return a.toInt() < b.toInt(); });
+        QCOMPARE(keys, QStringList({"0", "1", "2", "3", "4", "5", "7", "8", "9", "10", "11", "12",
+                                    "13", "14", "15", "16", "17", "18"}));
+        QCOMPARE(OptKeyNames().value("13"), OptKeyNames().value("5"));
+        QCOMPARE(OptKeyNames().value("18"), QStringLiteral("מומחים"));
+        QCOMPARE(f.Ui().Messages().size(), size_t(messages));
+        if (messages) {
+            QVERIFY(f.Ui().Texts().front().contains(QStringLiteral("-0-SetOptKeyLakTik-")));
+        }
+    }
+
+    void userKindAddedUnderItsKey() {
+        DialogFixture f;
+        f.Exec(QStringLiteral("OFFICE"), "INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (3, NULL, 1)");
+        f.Load();
+        QVERIFY(OptKeyNames().contains(QStringLiteral("1003")));
+        QCOMPARE(OptKeyNames().value(QStringLiteral("1003")), QString());
+    }
+
+    void failingListStopsTheRest() {
+        DialogFixture f;
+        SetCodeRows(f);
+        f.Exec(QStringLiteral("MDOCS"), "DROP TABLE DOCSTATUS");
+        f.Load();
+        QCOMPARE(f.Ui().Messages().size(), size_t(1));
+        QVERIFY(f.Ui().Texts().front().contains(QStringLiteral("-0-InitCbo10-")));
+        QCOMPARE(f.Child<QComboBox>("CboSecTeur").count(), 2);
+        QCOMPARE(f.Child<QComboBox>("CboStatus").count(), 0);
+        QCOMPARE(f.Child<QComboBox>("CboPartOf").count(), 0);
+        QCOMPARE(f.Child<QComboBox>("CboDocBasic").count(), 0);
+        // The rest of the load still runs.
+        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), QStringLiteral("08:00"));
+    }
+
+    void startFolder_data() {
+        QTest::addColumn<QString>("start");     // below the data folder; "-" outside it
+        QTest::addColumn<QString>("selected");  // below the data folder
+        QTest::newRow("empty") << ""
+                               << "DOCS/MAILIN";
+        QTest::newRow("inside the archive") << "DOCS/DOC1001"
+                                            << "DOCS/DOC1001";
+        QTest::newRow("the archive itself") << "DOCS"
+                                            << "DOCS";
+        QTest::newRow("outside the archive") << "-"
+                                             << "DOCS/MAILIN";
+        QTest::newRow("data folder") << "Def"
+                                     << "DOCS/MAILIN";
+    }
+    void startFolder() {
+        QFETCH(QString, start);
+        QFETCH(QString, selected);
+        DialogFixture f;
+        QDir(f.Docs() + QStringLiteral("/MAILIN")).removeRecursively();
+        QVERIFY(QDir().mkpath(f.Docs() + QStringLiteral("/DOC1001")));
+        QVERIFY(QDir().mkpath(f.Root() + QStringLiteral("/elsewhere")));
+        const QString startDir = start.isEmpty() ? QString()
+                                 : start == QLatin1String("-")
+                                     ? f.Root() + QStringLiteral("/elsewhere")
+                                     : f.DataDir() + QLatin1Char('/') + start;
+        FrmGetDocDet& d = f.Load([&](FrmGetDocDet& d) { d.SetStartDir(startDir); });
+        QVERIFY(QFileInfo(f.Docs() + QStringLiteral("/MAILIN")).isDir());
+        const QString want = f.DataDir() + QLatin1Char('/') + selected;
+        QCOMPARE(f.Child<FolderView>("FolderView1").SelectedPath(), want);
+        QCOMPARE(d.FileNameToSave(), want + QStringLiteral("/מכתב ללקוח"));
+    }
+
+    void handlerShown_data() {
+        QTest::addColumn<QString>("preset");
+        QTest::addColumn<QString>("shown");
+        QTest::newRow("the user") << ""
+                                  << "דנה כהן";
+        QTest::newRow("the caller's") << "משה לוי;רות כהן"
+                                      << "משה לוי;רות כהן";
+    }
+    void handlerShown() {
+        QFETCH(QString, preset);
+        QFETCH(QString, shown);
+        DialogFixture f;
+        f.Load([&](FrmGetDocDet& d) { d.SetDefaultMetapel(preset); });
+        QCOMPARE(f.Child<QLabel>("LPersonal").text(), shown);
+    }
+
+    void unidentifiedInstallation() {
+        SampleOptions options;
+        options.writeSettings = false;
+        DialogFixture f(options);
+        FrmGetDocDet& d = f.Load();
+        const auto& m = f.Ui().Messages();
+        QVERIFY(!m.empty());
+        QCOMPARE(m.back().text, QStringLiteral("אין זיהוי של עבודה בזורבן במחשב זה"));
+        QCOMPARE(m.back().style, int(vbCritical));
+        QCOMPARE(f.Child<QComboBox>("CboStatus").count(), 0);
+        QCOMPARE(f.Child<QLineEdit>("TxtTeur").text(), QString());
+        d.show();
+        d.close();
+        QVERIFY(d.IsCancel());
+    }
+
+    void fileNameCreatesItsFolders_data() {
+        QTest::addColumn<QString>("name");    // below the data folder
+        QTest::addColumn<QString>("folder");  // what must exist afterwards; empty: nothing new
+        QTest::newRow("new folders") << "DOCS/A/ב/name"
+                                     << "DOCS/A/ב";
+        QTest::newRow("backslashes") << "DOCS\\C\\D\\name"
+                                     << "DOCS/C/D";
+        QTest::newRow("no separator") << ""
+                                      << "";
+    }
+    void fileNameCreatesItsFolders() {
+        QFETCH(QString, name);
+        QFETCH(QString, folder);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        const QString value =
+            name.isEmpty() ? QStringLiteral("name") : f.DataDir() + QLatin1Char('/') + name;
+        d.SetFileNameToSave(value);
+        const QStringList before = QDir(f.DataDir()).entryList();
+        QCOMPARE(d.FileNameToSave(), value);
+        if (folder.isEmpty()) {
+            QCOMPARE(QDir(f.DataDir()).entryList(), before);
+        } else {
+            QVERIFY(QFileInfo(f.DataDir() + QLatin1Char('/') + folder).isDir());
+            QVERIFY(!QFileInfo::exists(f.DataDir() + QLatin1Char('/') + folder + "/name"));
+        }
+    }
+
+    void closing_data() {
+        QTest::addColumn<bool>("escape");
+        QTest::newRow("close box") << false;
+        QTest::newRow("escape") << true;
+    }
+    void closing() {
+        QFETCH(bool, escape);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        QVERIFY(!d.IsCancel());
+        if (escape) {
+            QTest::keyClick(&d, Qt::Key_Escape);
+        } else {
+            d.close();
+        }
+        QVERIFY(d.IsCancel());
+        QVERIFY(d.isHidden());
+    }
+};
+
+QTEST_MAIN(TestDialogLoad)
+#include "test_dialog_load.moc"

@@ -1,0 +1,252 @@
+// The filing dialog's target folder and name: the name box, the folder view, the inner
+// folder and the numbering button.
+
+#include <QComboBox>
+#include <QDir>
+#include <QFile>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QRadioButton>
+
+#include "dialog_fixture.h"
+#include "filing_dialog/folder_view.h"
+
+using namespace zv;
+using zv::test::DialogFixture;
+
+namespace {
+
+void Touch(const QString& path) {
+    QFile f(path);
+    QVERIFY2(f.open(QIODevice::WriteOnly), qPrintable(path));
+}
+
+void SetLabels(DialogFixture& f, const QString& client, const QString& kind, const QString& subKind,
+               const QString& caseNum, const QString& caseCode) {
+    f.Child<QLabel>("LakNum").setText(client);
+    f.Child<QLabel>("LblSug").setText(kind);
+    f.Child<QLabel>("LSugTik").setText(subKind);
+    f.Child<QLabel>("LTik").setText(caseNum);
+    f.Child<QLabel>("LTikNum").setText(caseCode);
+}
+
+}  // namespace
+
+class TestDialogNaming : public QObject {
+    Q_OBJECT
+
+  private slots:
+    void nameBox_data() {
+        QTest::addColumn<bool>("captureMail");
+        QTest::addColumn<bool>("fromScan");
+        QTest::addColumn<bool>("asked");
+        QTest::newRow("document") << false << false << true;
+        QTest::newRow("mail") << true << false << false;
+        QTest::newRow("scan") << false << true << false;
+    }
+    void nameBox() {
+        QFETCH(bool, captureMail);
+        QFETCH(bool, fromScan);
+        QFETCH(bool, asked);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load([&](FrmGetDocDet& d) {
+            d.SetIsCaptureMail(captureMail);
+            d.SetIsFromScan(fromScan);
+        });
+        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN/");
+        auto& name = f.Child<QLineEdit>("TxtTeur");
+        name.setText(QStringLiteral("חוזה שכירות"));
+        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("חוזה שכירות"));
+        name.clear();
+        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("חוזה שכירות"));
+        QCOMPARE(f.Child<QLabel>("LFileName").text(), d.FileNameToSave());
+        const QStringList want =
+            asked ? QStringList{QStringLiteral("חובה לקבוע שם למסמך שישמר")} : QStringList{};
+        QCOMPARE(f.Ui().Texts(), want);
+        if (asked) {
+            QCOMPARE(f.Ui().Messages().front().style, int(vbOKOnly));
+        }
+    }
+
+    void folderFollowsTheChoice_data() {
+        QTest::addColumn<QString>("client");
+        QTest::addColumn<QString>("kind");
+        QTest::addColumn<QString>("subKind");
+        QTest::addColumn<QString>("caseNum");
+        QTest::addColumn<QString>("caseCode");
+        QTest::addColumn<QString>("folder");  // below DOCS; empty: DOCS itself
+        QTest::newRow("client") << "1001"
+                                << "F"
+                                << ""
+                                << ""
+                                << ""
+                                << "DOC1001";
+        QTest::newRow("case") << "5"
+                              << "W"
+                              << ""
+                              << "9"
+                              << "W-9"
+                              << "DOC5/W/9";
+        QTest::newRow("bureau, no client") << ""
+                                           << "L"
+                                           << ""
+                                           << "3"
+                                           << "12-34"
+                                           << "DOC00000/L/1234";
+        QTest::newRow("general case") << "5"
+                                      << "T"
+                                      << "27"
+                                      << "9"
+                                      << "9"
+                                      << "DOC5/27/9";
+        QTest::newRow("no rule") << "5"
+                                 << "FS"
+                                 << ""
+                                 << ""
+                                 << ""
+                                 << "";
+    }
+    void folderFollowsTheChoice() {
+        QFETCH(QString, client);
+        QFETCH(QString, kind);
+        QFETCH(QString, subKind);
+        QFETCH(QString, caseNum);
+        QFETCH(QString, caseCode);
+        QFETCH(QString, folder);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        SetLabels(f, client, kind, subKind, caseNum, caseCode);
+        d.RefreshDocsFolder();
+        const QString want = folder.isEmpty() ? f.Docs() : f.Docs() + QLatin1Char('/') + folder;
+        QVERIFY(QFileInfo(want).isDir());
+        QCOMPARE(f.Child<FolderView>("FolderView1").SelectedPath(), want);
+        QCOMPARE(f.Child<QLabel>("LDir").text(), want);
+        QCOMPARE(d.FileNameToSave(), want + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(f.Ui().Texts(), QStringList());
+    }
+
+    void folderViewStaysInTheArchive() {
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        auto& tree = f.Child<FolderView>("FolderView1");
+        tree.show();
+        d.resize(1000, 800);
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN");
+
+        // Nothing outside the archive can be selected.
+        QVERIFY(!tree.SelectPath(f.DataDir() + QStringLiteral("/Def")));
+        QVERIFY(!tree.SelectPath(f.Root()));
+        QVERIFY(!tree.SelectPath(f.Docs() + QStringLiteral("/../Def")));
+        QCOMPARE(tree.SelectedPath(), mailIn);
+
+        // The archive is the only entry at the top of the tree.
+        auto* model = tree.model();
+        const QModelIndex top = tree.rootIndex();
+        QTRY_VERIFY(model->rowCount(top) > 1);
+        int shown = 0;
+        for (int row = 0; row < model->rowCount(top); ++row) {
+            if (!tree.isRowHidden(row, top)) {
+                ++shown;
+                QCOMPARE(model->index(row, 0, top).data().toString(), QStringLiteral("DOCS"));
+            }
+        }
+        QCOMPARE(shown, 1);
+
+        // A folder made a moment ago is selected and shown at once.
+        const QString fresh = f.Docs() + QStringLiteral("/DOC77/N/3");
+        QVERIFY(QDir().mkpath(fresh));
+        QVERIFY(tree.SelectPath(fresh));
+        QCOMPARE(tree.SelectedPath(), fresh);
+        QCOMPARE(tree.currentIndex().data().toString(), QStringLiteral("3"));
+
+        // A click reports the folder into LDir and the target follows.
+        const QModelIndex docs = tree.currentIndex().parent().parent().parent();
+        QCOMPARE(docs.data().toString(), QStringLiteral("DOCS"));
+        tree.scrollTo(docs);
+        QTest::mouseClick(tree.viewport(), Qt::LeftButton, {}, tree.visualRect(docs).center());
+        QCOMPARE(f.Child<QLabel>("LDir").text(), f.Docs());
+        QCOMPARE(d.FileNameToSave(), f.Docs() + QStringLiteral("/מכתב ללקוח"));
+    }
+
+    void innerFolder() {
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN");
+        auto& inner = f.Child<QComboBox>("CboDocBasic");
+        auto& direct = f.Child<QRadioButton>("Option1_0");
+        auto& nested = f.Child<QRadioButton>("Option1_1");
+        QVERIFY(inner.count() >= 2);
+
+        nested.click();
+        QCOMPARE(inner.currentIndex(), 0);
+        const QString first = inner.itemText(0);
+        QCOMPARE(d.DirToSave(), mailIn + QLatin1Char('/') + first + QLatin1Char('/'));
+        QCOMPARE(d.FileNameToSave(),
+                 mailIn + QLatin1Char('/') + first + QStringLiteral("/מכתב ללקוח"));
+        QVERIFY(QFileInfo(mailIn + QLatin1Char('/') + first).isDir());
+
+        direct.click();
+        QCOMPARE(inner.currentIndex(), -1);
+        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("/מכתב ללקוח"));
+
+        inner.setCurrentIndex(1);
+        QVERIFY(nested.isChecked());
+        QCOMPARE(d.FileNameToSave(),
+                 mailIn + QLatin1Char('/') + inner.itemText(1) + QStringLiteral("/מכתב ללקוח"));
+    }
+
+    void innerFolderWithoutEntries() {
+        DialogFixture f;
+        QDir(f.Docs() + QStringLiteral("/DOCBASIC")).removeRecursively();
+        FrmGetDocDet& d = f.Load();
+        QCOMPARE(f.Child<QComboBox>("CboDocBasic").count(), 0);
+        f.Child<QRadioButton>("Option1_1").click();
+        QCOMPARE(f.Child<QComboBox>("CboDocBasic").currentIndex(), -1);
+        QCOMPARE(d.DirToSave(), f.Docs() + QStringLiteral("/MAILIN/"));
+    }
+
+    void numbering_data() {
+        QTest::addColumn<QString>("ext");
+        QTest::addColumn<bool>("useInner");
+        QTest::addColumn<QString>("name");
+        QTest::newRow("doc") << "doc" << false << "T13";
+        QTest::newRow("doc, inner folder") << "doc" << true << "T13";
+        QTest::newRow("pdf") << "pdf" << false << "S8";
+        QTest::newRow("mail") << "eml" << false << "E1";
+        QTest::newRow("unknown extension") << "xlsx" << false << "מכתב ללקוח";
+    }
+    void numbering() {
+        QFETCH(QString, ext);
+        QFETCH(bool, useInner);
+        QFETCH(QString, name);
+        DialogFixture f;
+        SetSourceExt(ext);
+        FrmGetDocDet& d = f.Load();
+        SetLabels(f, QStringLiteral("5"), QStringLiteral("F"), {}, {}, {});
+        d.RefreshDocsFolder();
+        const QString folder = f.Docs() + QStringLiteral("/DOC5");
+        for (const char* file : {"T1.doc", "S7.pdf", "t12.docx", "Tax.doc"}) {
+            Touch(folder + QLatin1Char('/') + QLatin1String(file));
+        }
+        auto& inner = f.Child<QComboBox>("CboDocBasic");
+        if (useInner) {
+            inner.setCurrentIndex(0);
+            // Files of the inner folder do not count.
+            QVERIFY(QDir().mkpath(folder + QLatin1Char('/') + inner.currentText()));
+            Touch(folder + QLatin1Char('/') + inner.currentText() + QStringLiteral("/T50.doc"));
+        }
+        auto& box = f.Child<QLineEdit>("TxtTeur");
+        box.setText(QStringLiteral("שם אחר"));
+        f.Child<QPushButton>("CmdMPlus").click();
+        QCOMPARE(box.text(), name);
+        const QString dir = useInner ? folder + QLatin1Char('/') + inner.currentText() : folder;
+        QCOMPARE(d.FileNameToSave(), dir + QLatin1Char('/') + name);
+        QCOMPARE(f.Ui().Texts(), QStringList());
+    }
+};
+
+QTEST_MAIN(TestDialogNaming)
+#include "test_dialog_naming.moc"
