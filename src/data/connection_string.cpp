@@ -9,8 +9,9 @@
 namespace zv {
 
 QString QuoteConnectionValue(const QString& value) {
+    // Unquoted values lose the blanks around them when read back.
     const bool needs = value.contains(QLatin1Char(';')) || value.startsWith(QLatin1Char('"')) ||
-                       value.startsWith(QLatin1Char('\'')) || value.startsWith(QLatin1Char(' '));
+                       value.startsWith(QLatin1Char('\'')) || value != value.trimmed();
     if (!needs) {
         return value;
     }

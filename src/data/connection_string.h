@@ -6,8 +6,9 @@
 namespace zv {
 
 // "Provider=...;Data Source=...;Initial Catalog=<DbName><VolnaGlobNum>;..." as the suite
-// builds it. A value that holds ";" or begins with a quote or a blank is quoted the way
-// OLE DB and ODBC connection strings quote values; every other value stands as stored.
+// builds it. A value that holds ";", begins with a quote, or begins or ends with a blank is
+// quoted the way OLE DB and ODBC connection strings quote values; every other value stands
+// as stored.
 QString GetConnectionByDbName(const QString& dbName);
 
 // One value of a connection string, quoted only when it must be.

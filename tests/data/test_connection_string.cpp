@@ -84,10 +84,10 @@ void TestConnectionString::build_data() {
         << "SQLOLEDB"
         << "srv"
         << "sa"
-        << "p=w'x\"y "
+        << "p=w'x\"y"
         << "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
            "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=sa;Password=p=w'x\"y ;";
+           "User ID=sa;Password=p=w'x\"y;";
 }
 
 void TestConnectionString::build() {
@@ -197,6 +197,8 @@ void TestConnectionString::roundTripOfQuotedValues_data() {
     QTest::addColumn<QString>("password");
     QTest::newRow("semicolon") << "a;b";
     QTest::newRow("leading blank") << " pw";
+    QTest::newRow("trailing blank") << "pw ";
+    QTest::newRow("leading tab") << "\tpw";
     QTest::newRow("leading double quote") << "\"pw;";
     QTest::newRow("leading apostrophe") << "'pw";
     QTest::newRow("both quotes") << "'x\";y\"";
