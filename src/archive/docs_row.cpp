@@ -23,10 +23,12 @@
 namespace zv {
 namespace {
 
-// Saves of a new identifier on the file database. Every failed try means that another
-// writer saved a row with that identifier in the meantime, so a filing fails at most once
-// per other filing saved at the same moment; the bound ends the loop when the duplicates
-// come from elsewhere, and keeps the longest wait near two seconds.
+// Tries at saving a row whose new identifier another filer took first (file databases).
+// Every failed try means that another writer saved a row with that identifier meanwhile,
+// so a filing fails at most once per other filing saved at the same moment; twenty covers
+// far more people filing into one office's archive at once than there are, while the
+// bound still ends the loop if the duplicates come from elsewhere, and keeps the longest
+// wait under two seconds. The random pause keeps the losers from colliding again.
 constexpr int kIdTries = 20;
 constexpr int kMinPauseMs = 10;
 constexpr int kMaxPauseMs = 100;
@@ -34,7 +36,8 @@ constexpr int kMaxPauseMs = 100;
 // A duplicate outside the save ends the recording at once.
 struct Abandon {};
 
-// The reminder time as stored: "HH:MM", and 08:00 for an empty time box.
+// The reminder time as stored: "HH:MM", and 08:00 for an empty time box (no text, or the
+// box's empty mask).
 QString MemoHourText(const QString& text) {
     const QString trimmed = text.trimmed();
     if (trimmed.isEmpty() || trimmed == QStringLiteral("__:__")) {

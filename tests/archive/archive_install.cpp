@@ -8,6 +8,7 @@
 #include "data/database.h"
 #include "data/recordset.h"
 #include "sample_install/sample_install.h"
+#include "sample_install/test_server.h"
 #include "util/state.h"
 
 namespace zv::test {
@@ -20,18 +21,17 @@ bool OnServer(const QString& database) {
 }  // namespace
 
 ArchiveInstall::ArchiveInstall(bool docsOnServer, bool bmOnServer) {
-    SampleOptions options;
-    options.writeSettings = false;
-    if (docsOnServer || bmOnServer) {
-        const QString host = qEnvironmentVariable("ZV_PG_HOST");
-        if (host.isEmpty()) {
-            throw std::runtime_error("ZV_PG_HOST is not set: the test needs the pg fixture");
-        }
-        options.serverDataSource = host + QLatin1Char(',') + qEnvironmentVariable("ZV_PG_PORT");
-        options.serverUser = qEnvironmentVariable("ZV_PG_USER");
-        options.onServerDocs = docsOnServer;
-        options.onServerBM = bmOnServer;
+    const bool server = docsOnServer || bmOnServer;
+    // One client number per process: each test replaces the same four server databases
+    // instead of leaving four more behind in the cluster.
+    static const SampleOptions serverOptions = TestServerOptions();
+    SampleOptions options = server ? serverOptions : SampleOptions();
+    if (server && options.serverDataSource.isEmpty()) {
+        throw std::runtime_error("no PostgreSQL test cluster: the test needs the pg fixture");
     }
+    options.writeSettings = false;
+    options.onServerDocs = docsOnServer;
+    options.onServerBM = bmOnServer;
     CreateSampleInstallation(MainDir(), options);
 
     SetMainPath(QDir(MainDir()).absolutePath());

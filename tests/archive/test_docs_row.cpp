@@ -11,6 +11,7 @@
 #include "data/database.h"
 #include "data/recordset.h"
 #include "data/values.h"
+#include "sample_install/test_server.h"
 #include "scripted_ui.h"
 #include "util/clock.h"
 #include "util/state.h"
@@ -105,6 +106,7 @@ qint64 MaxDocId(const test::ArchiveInstall& in) {
 class TestDocsRow : public QObject {
     Q_OBJECT
   private Q_SLOTS:
+    void initTestCase();
     void init();
     void cleanup();
     void newRow_data();
@@ -129,6 +131,13 @@ class TestDocsRow : public QObject {
   private:
     std::unique_ptr<test::ScopedScriptedUi> ui_;
 };
+
+void TestDocsRow::initTestCase() {
+    if (kServer) {
+        const SampleOptions options = TestServerOptions();
+        ZV_REQUIRE_TEST_SERVER(options);
+    }
+}
 
 void TestDocsRow::init() {
     ui_ = std::make_unique<test::ScopedScriptedUi>();
