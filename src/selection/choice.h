@@ -22,9 +22,11 @@ struct ChoiceLabels {
 
 // CmdLak: the client list window; true when a client was chosen and the labels changed.
 bool ChooseClient(ChoiceLabels& labels);
-// CmdTik: the chosen client's case files; true when a case was chosen.
+// CmdTik: the chosen client's case files; true when the window was confirmed, also from an
+// empty list (the labels then stay as they were, and the folder view is refreshed).
 bool ChooseClientCase(ChoiceLabels& labels);
-// CmdGetTikByName: names and cases of the whole database; true when a row was chosen.
+// CmdGetTikByName: names and cases of the whole database; true when a row was chosen and
+// taken. A row of a kind without a folder rule changes nothing and gives false.
 bool ChooseCaseByName(ChoiceLabels& labels);
 // The display name of a client number, or the number itself when unknown.
 QString GetClientTeur(const QVariant& num);

@@ -21,6 +21,7 @@
 #include "selection/list_model.h"
 #include "selection/list_window.h"
 #include "test_env.h"
+#include "util/keyboard_layout.h"
 #include "util/settings_store.h"
 #include "util/state.h"
 #include "watchdog.h"
@@ -171,6 +172,9 @@ class TestSelection : public QObject {
     void clientSearch_data();
     void clientSearch();
     void enterSearches();
+    void searchBoxSwitchesToHebrew();
+    void currentRowMarking();
+    void unreachableDatabaseReported();
     void namesOfOneClient_data();
     void namesOfOneClient();
     void allNames();
@@ -318,6 +322,64 @@ void TestSelection::enterSearches() {
     box->clear();
     Click(w, "cmdSearch");
     QCOMPARE(w.RecordCount(), kClientCount + 1);
+}
+
+void TestSelection::searchBoxSwitchesToHebrew() {
+    class Recorder : public KeyboardPlatform {
+      public:
+        explicit Recorder(QStringList& loaded) : loaded_(loaded) {}
+        QString ActiveLayoutName() override { return active_; }
+        void LoadLayout(const QString& id) override {
+            loaded_ << id;
+            active_ = id;
+        }
+
+      private:
+        QStringList& loaded_;
+        QString active_ = QStringLiteral("00000409");
+    };
+    QStringList loaded;
+    auto previous = SetKeyboardPlatform(std::make_unique<Recorder>(loaded));
+    for (const auto variant : {kClients, kNames}) {
+        ListWindow w(variant);
+        w.show();
+        QFocusEvent focus(QEvent::FocusIn);
+        QApplication::sendEvent(w.findChild<QLineEdit*>(QStringLiteral("txtSearch")), &focus);
+    }
+    SetKeyboardPlatform(std::move(previous));
+    QCOMPARE(loaded, QStringList{"0000040D"});
+}
+
+void TestSelection::currentRowMarking() {
+    ListWindow w(kClients);
+    w.show();
+    Grid(w)->setCurrentIndex(w.Model().index(5, 2));
+    const auto marked = Grid(w)->selectionModel()->selectedRows();
+    // The file variant marks the current row alone; the server variant marks nothing.
+    if (kServer) {
+        QVERIFY(marked.isEmpty());
+    } else {
+        QCOMPARE(marked.size(), 1);
+        QCOMPARE(marked.first().row(), 5);
+    }
+}
+
+void TestSelection::unreachableDatabaseReported() {
+    if (kServer) {
+        SetDataSource(env_->Root() + QStringLiteral("/no-server,1"));
+    } else {
+        SetMainPath(env_->Root() + QStringLiteral("/no-installation"));
+    }
+    ListWindow w(kNames);
+    w.show();
+    QCOMPARE(w.RecordCount(), 0);
+    QCOMPARE(Counter(w), QStringLiteral("רשומה מס' 0 מתוך  0"));
+    Search(w, QStringLiteral("כהן"));
+    const auto texts = (*ui_)->Texts();
+    QCOMPARE(texts.size(), 2);
+    QVERIFY2(texts[0].contains(QStringLiteral("--")), qPrintable(texts[0]));
+    QCOMPARE(texts[1], QStringLiteral("424-DoSearch-Object required"));
+    (*ui_)->Clear();
 }
 
 void TestSelection::namesOfOneClient_data() {
