@@ -8,15 +8,11 @@ namespace {
 
 constexpr int kGeneralCase = 11;
 
-// The catalogue compares its keys as text without regard to case.
+// Keys are decimal numbers, so comparing them without regard to case changes nothing.
 const QString* Lookup(const QString& key) {
     const auto& names = OptKeyNames();
-    for (auto it = names.constBegin(); it != names.constEnd(); ++it) {
-        if (it.key().compare(key, Qt::CaseInsensitive) == 0) {
-            return &it.value();
-        }
-    }
-    return nullptr;
+    const auto it = names.constFind(key);
+    return it == names.constEnd() ? nullptr : &it.value();
 }
 
 }  // namespace
