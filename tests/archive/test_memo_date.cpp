@@ -1,4 +1,4 @@
-// The reminder moment, the remark history and the values of empty date boxes.
+// The reminder moment and the remark history.
 #include <QtTest>
 
 #include "archive/date_values.h"
@@ -29,7 +29,6 @@ class TestMemoDate : public QObject {
     void messageOnlyWhenAskedAndFailed_data();
     void messageOnlyWhenAskedAndFailed();
     void unreadableDateIsReported();
-    void emptyDateBoxIsZeroDate();
     void remarkStamp();
     void remarkHistory_data();
     void remarkHistory();
@@ -119,11 +118,6 @@ void TestMemoDate::unreadableDateIsReported() {
     QVERIFY(!GetmDate(QStringLiteral("soon"), QStringLiteral("08:00"), result, true));
     QCOMPARE(ui->Texts(), QStringList{QStringLiteral("13-GetmDate-Type mismatch")});
     QCOMPARE(ui->Messages().front().style, int(vbOKOnly));
-}
-
-void TestMemoDate::emptyDateBoxIsZeroDate() {
-    QCOMPARE(DateBoxValue(QDate()), At(1899, 12, 30));
-    QCOMPARE(DateBoxValue(QDate(2026, 3, 1)), At(2026, 3, 1));
 }
 
 // The test runs in the en_US locale (set by CMake): short date M/d/yy, long time
