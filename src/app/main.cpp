@@ -8,9 +8,7 @@
 #include <cstdio>
 #include <memory>
 
-#include "filing/batch_filing.h"
-#include "filing/work_with_str.h"
-#include "startup/backend_selection.h"
+#include "filing/filing_request_handler.h"
 #include "startup/command_line.h"
 #include "startup/main_entry.h"
 #include "startup/request_text.h"
@@ -61,16 +59,6 @@ void PrepareHebrewUi(QApplication& app) {
     }
 }
 
-// Handles a request that passed Main's checks: the back-ends, then the filing, with the
-// dialog or from the batch options. Returns the archived file's path, empty when nothing
-// was filed.
-QString HandleFilingRequest(const zv::CommandLine& cl, int mode, const QString& path,
-                            const QString& name) {
-    zv::GetMSSQLParam();
-    return cl.batch ? zv::FileWithoutWindow(mode, path, name, cl.filing)
-                    : zv::WorkWithStr(mode, path, name);
-}
-
 }  // namespace
 
 int main(int argc, char** argv) {
@@ -104,7 +92,7 @@ int main(int argc, char** argv) {
     QString archived;
     const int status =
         zv::Main(zv::DecodeArgumentText(cl.request), [&](int& mode, QString& path, QString& name) {
-            archived = HandleFilingRequest(cl, mode, path, name);
+            archived = zv::HandleFilingRequest(cl, mode, path, name);
         });
     if (!cl.batch || status != 0) {
         return status;

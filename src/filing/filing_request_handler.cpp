@@ -1,0 +1,16 @@
+#include "filing/filing_request_handler.h"
+
+#include "filing/batch_filing.h"
+#include "filing/work_with_str.h"
+#include "startup/backend_selection.h"
+
+namespace zv {
+
+QString HandleFilingRequest(const CommandLine& cl, int mode, const QString& path,
+                            const QString& name) {
+    GetMSSQLParam();
+    return cl.batch ? FileWithoutWindow(mode, path, name, cl.filing)
+                    : WorkWithStr(mode, path, name);
+}
+
+}  // namespace zv
