@@ -40,7 +40,7 @@ QString SetText(QString& field, const QString& value) {
 QString SetReminder(FilingOptions& o, const QString& value) {
     const QStringList parts = value.split(QLatin1Char(' '), Qt::SkipEmptyParts);
     const QTime time =
-        parts.size() == 2 ? QTime::fromString(parts.at(1), QStringLiteral("HH:mm")) : QTime();
+        parts.size() == 2 ? QTime::fromString(parts.at(1), QStringLiteral("H:mm")) : QTime();
     o.reminderDate = parts.size() == 2 ? ParseDate(parts.at(0)) : std::nullopt;
     if (!o.reminderDate || !time.isValid()) {
         o.reminderDate.reset();
