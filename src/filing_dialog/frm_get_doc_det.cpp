@@ -27,6 +27,8 @@ FrmGetDocDet::FrmGetDocDet(QWidget* parent) : QDialog(parent), ui_(new ::Ui::Frm
     ui_->LDir->setTextInteractionFlags(Qt::TextSelectableByMouse);
     new NameGuard(ui_->TxtTeur);
     ConnectEvents();
+    // The first step is choosing the client; without this the default button takes the focus.
+    ui_->CmdLak->setFocus();
 }
 
 FrmGetDocDet::~FrmGetDocDet() = default;

@@ -2,6 +2,7 @@
 
 #include <QComboBox>
 #include <QDir>
+#include <QSignalBlocker>
 
 #include "controls/gdate.h"
 #include "dialogs/frm_get_users.h"
@@ -33,6 +34,8 @@ void FrmGetDocDet::InitCbo10() {
              ui_->CboSecTeur->setCurrentIndex(-1);
              FillStatuses();
              FillOrigins();
+             // Filling the list is no choice of an inner folder.
+             const QSignalBlocker quiet(ui_->CboDocBasic);
              ui_->CboDocBasic->addItems(ReadInnerFolders());
              ui_->CboDocBasic->setCurrentIndex(-1);
          });

@@ -369,7 +369,12 @@ class TestDialogConfirm : public QObject {
         f.Child<QWidget>("FolderView1").show();
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
-        QVERIFY(f.Child<QPushButton>("CmdOK").isDefault());
+        // The first step has the focus; Enter in a text box confirms.
+        QCOMPARE(QApplication::focusWidget(), &f.Child<QWidget>("CmdLak"));
+        f.Child<QLineEdit>("TxtRemark").setFocus();
+        QTest::keyClick(&f.Child<QLineEdit>("TxtRemark"), Qt::Key_Return);
+        QCOMPARE(f.Ui().Texts(),
+                 QStringList{QStringLiteral("חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך")});
         // Each control of the tab chain follows the one before it in reading order: further
         // left on the same line, or on a lower line; the chain starts again at the top of the
         // folder column, left of the properties.

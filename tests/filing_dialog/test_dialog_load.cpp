@@ -5,6 +5,7 @@
 #include <QDir>
 #include <QLabel>
 #include <QLineEdit>
+#include <QRadioButton>
 #include <QSet>
 
 #include "controls/gdate.h"
@@ -90,6 +91,7 @@ class TestDialogLoad : public QObject {
         QCOMPARE(QSet<QString>(inner.begin(), inner.end()),
                  QSet<QString>(SampleDocBasicFolders().begin(), SampleDocBasicFolders().end()));
         QCOMPARE(f.Child<QComboBox>("CboDocBasic").currentIndex(), -1);
+        QVERIFY(f.Child<QRadioButton>("Option1_0").isChecked());
 
         QCOMPARE(f.Child<GDate>("TDate").date(), QDate(2026, 3, 17));
         QCOMPARE(f.Child<GDate>("TDateMemo").date(), QDate(2026, 3, 17));
