@@ -8,6 +8,7 @@
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
+#include <QListWidget>
 #include <QMimeData>
 #include <QPushButton>
 
@@ -15,6 +16,7 @@
 #include "controls/gdate.h"
 #include "dialog_fixture.h"
 #include "dialogs/frm_get_password.h"
+#include "dialogs/frm_get_users.h"
 #include "filing_dialog/name_guard.h"
 #include "util/keyboard_layout.h"
 
@@ -192,6 +194,42 @@ class TestDialogConfirm : public QObject {
             QCOMPARE(f.Ui().Texts(), QStringList());
         }
         QCOMPARE(f.Ui().UnexpectedModals(), 0);
+    }
+
+    void handlerPicker_data() {
+        QTest::addColumn<QStringList>("pick");  // "-": the picker is closed
+        QTest::addColumn<QString>("shown");
+        QTest::newRow("two users") << QStringList{"יוסי לוי", "מיכל ברק"} << "יוסי לוי;מיכל ברק";
+        QTest::newRow("nobody") << QStringList{} << "דנה כהן";
+        QTest::newRow("closed") << QStringList{"-"} << "משה לוי";
+    }
+    void handlerPicker() {
+        QFETCH(QStringList, pick);
+        QFETCH(QString, shown);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load([](FrmGetDocDet& d) { d.SetDefaultMetapel("משה לוי"); });
+        d.show();
+        QString start;
+        bool all = false;
+        f.Ui().QueueModal([&](QWidget& w) {
+            auto& picker = dynamic_cast<FrmGetUsers&>(w);
+            start = picker.StartUsers();
+            all = picker.WithAllUsers();
+            if (pick == QStringList{QStringLiteral("-")}) {
+                picker.close();
+                return;
+            }
+            picker.List1().clearSelection();
+            for (int i = 0; i < picker.List1().count(); ++i) {
+                picker.List1().item(i)->setSelected(pick.contains(picker.List1().item(i)->text()));
+            }
+            picker.Command1().click();
+        });
+        f.Child<QPushButton>("CmdListOpen").click();
+        QCOMPARE(start, QStringLiteral("משה לוי"));
+        QVERIFY(all);
+        QCOMPARE(f.Child<QLabel>("LPersonal").text(), shown);
+        QCOMPARE(d.Details().handlers, shown);
     }
 
     void currentTimeAndReminder() {

@@ -3,14 +3,17 @@
 
 #include <QComboBox>
 #include <QDir>
+#include <QFile>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPushButton>
 #include <QRadioButton>
 #include <QSet>
 
 #include "controls/gdate.h"
 #include "dialog_fixture.h"
 #include "filing_dialog/folder_view.h"
+#include "util/settings_store.h"
 
 using namespace zv;
 using zv::test::DialogFixture;
@@ -303,6 +306,30 @@ class TestDialogLoad : public QObject {
             QVERIFY(QFileInfo(f.DataDir() + QLatin1Char('/') + folder).isDir());
             QVERIFY(!QFileInfo::exists(f.DataDir() + QLatin1Char('/') + folder + "/name"));
         }
+    }
+
+    void mediumFontMarker_data() {
+        QTest::addColumn<bool>("marker");
+        QTest::newRow("with the user's marker") << true;
+        QTest::newRow("without") << false;
+    }
+    void mediumFontMarker() {
+        QFETCH(bool, marker);
+        DialogFixture f;
+        SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"),
+                    QStringLiteral("MedFontName"), QStringLiteral("DejaVu Serif"));
+        SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"),
+                    QStringLiteral("MedFontSize"), QStringLiteral("13"));
+        QVERIFY(QDir().mkpath(f.DataDir() + QStringLiteral("/GDetDef")));
+        if (marker) {
+            QFile file(f.DataDir() + QStringLiteral("/GDetDef/LB81.1"));
+            QVERIFY(file.open(QIODevice::WriteOnly));
+        }
+        f.Load();
+        QCOMPARE(f.Child<QLabel>("Label4").font().pointSize() == 13, marker);
+        QCOMPARE(f.Child<QPushButton>("CmdOK").font().pointSize() == 13, marker);
+        QVERIFY(f.Child<QLineEdit>("TxtTeur").font().pointSize() != 13);
+        QCOMPARE(f.Ui().Texts(), QStringList());
     }
 
     void closing_data() {

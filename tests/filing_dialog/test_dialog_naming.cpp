@@ -126,6 +126,46 @@ class TestDialogNaming : public QObject {
         QCOMPARE(f.Ui().Texts(), QStringList());
     }
 
+    void clientButton_data() {
+        QTest::addColumn<bool>("choose");
+        QTest::newRow("chosen") << true;
+        QTest::newRow("closed") << false;
+    }
+    void clientButton() {
+        QFETCH(bool, choose);
+        DialogFixture f;
+        FrmGetDocDet& d = f.Load();
+        SetLabels(f, QStringLiteral("5"), QStringLiteral("W"), {}, QStringLiteral("9"), {});
+        d.show();
+        f.Ui().QueueModal([&](QWidget& list) {
+            if (!choose) {
+                list.close();
+                return;
+            }
+            for (auto* b : list.findChildren<QPushButton*>()) {
+                if (b->text() == QStringLiteral("בחר וסגור")) {
+                    b->click();
+                }
+            }
+        });
+        f.Child<QPushButton>("CmdLak").click();
+        QCOMPARE(f.Ui().UnexpectedModals(), 0);
+        auto& tree = f.Child<FolderView>("FolderView1");
+        if (choose) {
+            QCOMPARE(f.Child<QLabel>("LakNum").text(), QStringLiteral("1001"));
+            QCOMPARE(f.Child<QLabel>("LblSug").text(), QStringLiteral("F"));
+            QCOMPARE(f.Child<QLabel>("LTik").text(), QString());
+            QVERIFY(tree.isVisible());
+            QCOMPARE(tree.SelectedPath(), f.Docs() + QStringLiteral("/DOC1001"));
+            QCOMPARE(d.FileNameToSave(), f.Docs() + QStringLiteral("/DOC1001/מכתב ללקוח"));
+        } else {
+            QCOMPARE(f.Child<QLabel>("LakNum").text(), QStringLiteral("5"));
+            QCOMPARE(f.Child<QLabel>("LTik").text(), QStringLiteral("9"));
+            QVERIFY(!tree.isVisible());
+            QCOMPARE(tree.SelectedPath(), f.Docs() + QStringLiteral("/MAILIN"));
+        }
+    }
+
     void folderViewStaysInTheArchive() {
         DialogFixture f;
         FrmGetDocDet& d = f.Load();
