@@ -53,7 +53,7 @@ QString WorkWithStr(int mode, const QString& path, const QString& name) {
         if (answer.fileNameToSave.isEmpty()) {
             return {};
         }
-        answer.nameText = dialog.findChild<QLineEdit*>(QStringLiteral("TxtTeur"))->text();
+        answer.nameText = dialog.TxtTeurText();
         answer.details = dialog.Details();
         return FileDocument(mode, path, name, answer, AskSaveAs);
     } catch (const VbError& e) {

@@ -147,6 +147,10 @@ void FrmGetDocDet::LoadSteps() {
     });
 }
 
+QString FrmGetDocDet::TxtTeurText() const {
+    return ui_->TxtTeur->text();
+}
+
 DocDetails FrmGetDocDet::Details() const {
     DocDetails d;
     d.handlers = ui_->LPersonal->text();

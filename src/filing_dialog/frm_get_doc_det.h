@@ -61,6 +61,8 @@ class FrmGetDocDet : public QDialog {
     void RefreshDocsFolder();
     // The confirmed dialog as a value, for the archive.
     DocDetails Details() const;
+    // The document name typed in TxtTeur (a mail's file name).
+    QString TxtTeurText() const;
 
     // The load steps; they run once, when the dialog is first shown or on this call.
     void Load();
