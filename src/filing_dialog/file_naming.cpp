@@ -33,11 +33,11 @@ double NumberOf(const QString& name) {
     return std::nearbyint(GetDblFromStr(stem.mid(1)));
 }
 
-}  // namespace
-
 bool EndsWithSeparator(const QString& path) {
     return !path.isEmpty() && IsSeparator(path.back());
 }
+
+}  // namespace
 
 QString CCpath(const QString& path) {
     if (path.isEmpty()) {

@@ -14,9 +14,6 @@ QString CCpath(const QString& path);
 // The part of a path after its last separator ("\" or "/"); unchanged without one.
 QString TruncateFileName(const QString& path);
 
-// True when the path ends with a separator ("\" or "/").
-bool EndsWithSeparator(const QString& path);
-
 // The next free numbered file in folder: the folder (upper-cased, with a trailing separator),
 // the letter, one more than the highest number already used after that letter, then "." and
 // ext when ext is not empty. Empty when folder is empty or cannot be read. One pass over the

@@ -35,10 +35,9 @@ FrmGetDocDet::~FrmGetDocDet() = default;
 
 QString FrmGetDocDet::FileNameToSave() {
     const QString value = fileNameToSave_;
-    const qsizetype sep =
-        std::max(value.lastIndexOf(QLatin1Char('\\')), value.lastIndexOf(QLatin1Char('/')));
-    if (sep > 0) {
-        BuildDirTree(value.left(sep));
+    const qsizetype folderLength = value.size() - TruncateFileName(value).size() - 1;
+    if (folderLength > 0) {
+        BuildDirTree(value.left(folderLength));
     }
     return value;
 }
