@@ -29,6 +29,7 @@ struct LazyQuery::Impl {
     QSqlQuery query;
     QString cursor;  // PostgreSQL only
     bool ownsTransaction = false;
+    long long fetched = 0;
 };
 
 LazyQuery::LazyQuery(Database& db, const QString& sql)
@@ -42,11 +43,14 @@ LazyQuery::LazyQuery(Database& db, const QString& sql)
         return;
     }
     // A cursor lives inside a transaction; the list only reads, so it is rolled back.
+    // The rows are counted by running through the cursor, so it is planned for reading
+    // every row, as the engine would plan the query on its own.
     auto handle = db.Handle();
     d_->ownsTransaction = handle.transaction();
     d_->cursor = NextCursorName();
-    if (!d_->query.exec(QStringLiteral("DECLARE ") + d_->cursor +
-                        QStringLiteral(" NO SCROLL CURSOR FOR ") + engineSql)) {
+    if (!d_->query.exec(QStringLiteral("SET LOCAL cursor_tuple_fraction = 1")) ||
+        !d_->query.exec(QStringLiteral("DECLARE ") + d_->cursor +
+                        QStringLiteral(" SCROLL CURSOR FOR ") + engineSql)) {
         const auto error = QueryError(db, d_->query);
         if (d_->ownsTransaction) {
             handle.rollback();
@@ -80,6 +84,7 @@ std::vector<QSqlRecord> LazyQuery::Fetch(int count) {
     while (static_cast<int>(rows.size()) < count && d_->query.next()) {
         rows.push_back(d_->query.record());
     }
+    d_->fetched += static_cast<long long>(rows.size());
     if (static_cast<int>(rows.size()) < count) {
         atEnd_ = true;
         if (d_->query.lastError().isValid()) {
@@ -89,11 +94,25 @@ std::vector<QSqlRecord> LazyQuery::Fetch(int count) {
     return rows;
 }
 
-long long QueryCount(Database& db, const QString& sql) {
-    QSqlQuery q(db.Handle());
+long long LazyQuery::TotalRows(const QString& countSql) {
+    if (atEnd_) {
+        return d_->fetched;
+    }
+    QSqlQuery q(db_.Handle());
     q.setForwardOnly(true);
-    if (!q.exec(db.EngineSql(sql)) || !q.next()) {
-        throw QueryError(db, q);
+    if (!d_->cursor.isEmpty()) {
+        // The cursor has computed the rows already; moving over them costs no second query.
+        if (!q.exec(QStringLiteral("MOVE FORWARD ALL IN ") + d_->cursor)) {
+            throw QueryError(db_, q);
+        }
+        const long long rest = q.numRowsAffected();
+        if (!q.exec(QStringLiteral("MOVE ABSOLUTE %1 IN %2").arg(d_->fetched).arg(d_->cursor))) {
+            throw QueryError(db_, q);
+        }
+        return d_->fetched + rest;
+    }
+    if (!q.exec(db_.EngineSql(countSql)) || !q.next()) {
+        throw QueryError(db_, q);
     }
     return q.value(0).toLongLong();
 }

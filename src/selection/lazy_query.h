@@ -2,7 +2,7 @@
 // Reads the rows of one query a batch at a time, so that a list of a million rows opens
 // after reading its first rows only. A file database steps a forward-only statement;
 // PostgreSQL reads through a cursor, since its driver would otherwise fetch the whole
-// result before returning the first row.
+// result into memory before returning the first row.
 
 #include <QSqlRecord>
 #include <QString>
@@ -23,6 +23,10 @@ class LazyQuery {
     // Up to count further rows; fewer only at the end. Throws VbError.
     std::vector<QSqlRecord> Fetch(int count);
     bool AtEnd() const { return atEnd_; }
+    // The number of rows of the whole query, read or not. A cursor counts them by moving
+    // to its end and back; a statement of a file database is counted by countSql, the same
+    // condition as "SELECT COUNT(*) ...". Throws VbError.
+    long long TotalRows(const QString& countSql);
 
   private:
     struct Impl;
@@ -30,8 +34,5 @@ class LazyQuery {
     bool atEnd_ = false;
     std::unique_ptr<Impl> d_;
 };
-
-// The single number a query such as "SELECT COUNT(*) ..." returns. Throws VbError.
-long long QueryCount(Database& db, const QString& sql);
 
 }  // namespace zv

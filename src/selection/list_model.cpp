@@ -33,9 +33,7 @@ void ListModel::SetQuery(Database& db, const ListQuery& query) {
     try {
         query_ = std::make_unique<LazyQuery>(db, query.Text());
         rows_ = query_->Fetch(kBatch);
-        // A list that fits in one batch is counted already; a longer one asks the database.
-        total_ = query_->AtEnd() ? static_cast<long long>(rows_.size())
-                                 : QueryCount(db, query.CountText());
+        total_ = query_->TotalRows(query.CountText());
     } catch (...) {
         rows_.clear();
         query_.reset();
