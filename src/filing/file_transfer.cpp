@@ -49,7 +49,7 @@ bool IsSameFile(const QString& a, const QString& b) {
     return fs::equivalent(FsPath(a), FsPath(b), ec);
 }
 
-void DeleteFile(const QString& path) {
+void RemoveFile(const QString& path) {
     std::error_code ec;
     if (!fs::remove(FsPath(path), ec) && !ec) {
         ec = std::make_error_code(std::errc::no_such_file_or_directory);

@@ -15,6 +15,6 @@ void CopyFileOver(const QString& source, const QString& target);
 bool IsSameFile(const QString& a, const QString& b);
 
 // Deletes a file; throws the runtime's VbError when it cannot.
-void DeleteFile(const QString& path);
+void RemoveFile(const QString& path);
 
 }  // namespace zv

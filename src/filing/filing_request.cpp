@@ -119,7 +119,7 @@ QString Filing::Record() {
         // Nothing is left in the archive without its row, but a file that was replaced is
         // not removed: its own row may still describe it.
         if (!inPlace_ && !replaced_) {
-            Do([&] { DeleteFile(target_); });
+            Do([&] { RemoveFile(target_); });
         }
         MsgBox(QStringLiteral("המסמך לא נרשם במערכת, קובץ המקור נשאר במקומו :") + kCrLf + path_,
                vbOKOnly | vbCritical);
@@ -128,7 +128,7 @@ QString Filing::Record() {
     QString sourceLeft;
     if (!inPlace_) {
         try {
-            DeleteFile(path_);
+            RemoveFile(path_);
         } catch (const VbError& e) {
             sourceLeft = e.Description();
         }
