@@ -323,6 +323,10 @@ void ListWindow::SetGridStruct(bool isReset) {
         palette.setColor(group, QPalette::HighlightedText, kRowText);
     }
     grid_->setPalette(palette);
+    // Rows as high as the current row's larger font needs.
+    QFont rowFont = grid_->font();
+    rowFont.setPointSize(kRowFontSize);
+    grid_->verticalHeader()->setDefaultSectionSize(QFontMetrics(rowFont).height() + 6);
     auto captionPalette = gridCaption_->palette();
     captionPalette.setColor(QPalette::Window, kCaptionBack);
     gridCaption_->setPalette(captionPalette);
