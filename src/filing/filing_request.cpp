@@ -1,6 +1,8 @@
 #include "filing/filing_request.h"
 
 #include <QDir>
+#include <QStringList>
+#include <memory>
 
 #include "archive/docs_row.h"
 #include "filing/clean_file_name.h"
@@ -36,6 +38,50 @@ QString MailExtensionRule(const QString& target) {
     }
     return target + QLatin1Char('.') + SourceExt();
 }
+
+// While it lives, messages are held instead of shown; windows and events go on as before.
+// A recording that fails then tells the user once, with the reasons it was given.
+class HeldMessages {
+  public:
+    struct Message {
+        QString text;
+        int style;
+        QString title;
+    };
+
+    HeldMessages() { previous_ = SetUi(std::make_unique<Holder>(*this)); }
+    ~HeldMessages() {
+        if (previous_) {
+            SetUi(std::move(previous_));
+        }
+    }
+    HeldMessages(const HeldMessages&) = delete;
+    HeldMessages& operator=(const HeldMessages&) = delete;
+
+    // Ends the hold and returns what was held.
+    std::vector<Message> Release() {
+        SetUi(std::move(previous_));
+        return std::move(held_);
+    }
+
+  private:
+    class Holder : public Ui {
+      public:
+        explicit Holder(HeldMessages& hold) : hold_(hold) {}
+        int MsgBox(const QString& text, int style, const QString& title) override {
+            hold_.held_.push_back({text, style, title});
+            return DefaultAnswer(style);
+        }
+        void ShowModal(QWidget& window) override { hold_.previous_->ShowModal(window); }
+        void DoEvents() override { hold_.previous_->DoEvents(); }
+
+      private:
+        HeldMessages& hold_;
+    };
+
+    std::unique_ptr<Ui> previous_;
+    std::vector<Message> held_;
+};
 
 // One request in progress; each step that fails ends it unless this is a development run.
 class Filing {
@@ -115,15 +161,26 @@ bool Filing::Copy() {
 }
 
 QString Filing::Record() {
-    if (!AddDocToListByAddIn(target_, &answer_.details)) {
+    HeldMessages hold;
+    const bool saved = AddDocToListByAddIn(target_, &answer_.details);
+    const std::vector<HeldMessages::Message> held = hold.Release();
+    if (!saved) {
         // Nothing is left in the archive without its row, but a file that was replaced is
         // not removed: its own row may still describe it.
         if (!inPlace_ && !replaced_) {
             Do([&] { RemoveFile(target_); });
         }
-        MsgBox(QStringLiteral("המסמך לא נרשם במערכת, קובץ המקור נשאר במקומו :") + kCrLf + path_,
-               vbOKOnly | vbCritical);
+        // One message: what happened to the document, then why.
+        QString text =
+            QStringLiteral("המסמך לא נרשם במערכת, קובץ המקור נשאר במקומו :") + kCrLf + path_;
+        for (const HeldMessages::Message& m : held) {
+            text += kCrLf + kCrLf + m.text;
+        }
+        MsgBox(text, vbOKOnly | vbCritical);
         return {};
+    }
+    for (const HeldMessages::Message& m : held) {
+        MsgBox(m.text, m.style, m.title);
     }
     QString sourceLeft;
     if (!inPlace_) {
