@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <system_error>
 
+#include "util/errors.h"
 #include "util/file_utils.h"
 
 namespace zv {
@@ -40,6 +41,11 @@ void CopyFileOver(const QString& source, const QString& target) {
     if (ec) {
         std::error_code ignored;
         fs::remove(part, ignored);
+        // A source that went away is "file not found", as the runtime's FileCopy says; a
+        // missing target folder stays "path not found".
+        if (ec == std::errc::no_such_file_or_directory && !fs::exists(FsPath(source), ignored)) {
+            throw MakeError(err::FileNotFound);
+        }
         throw FileSystemError(ec.value());
     }
 }
