@@ -90,8 +90,7 @@ std::optional<FilingAnswer> BatchAnswer(int mode, const QString& name, const Fil
     const QString folder = GetDocsDirByClientTik(labels->lakNum, labels->lblSug, labels->lSugTik,
                                                  labels->lTik, labels->lTikNum);
     if (folder.isEmpty()) {
-        Refuse(QStringLiteral("בעיה בבניית ספריית לקוח/תיק") + kCrLf + o.client);
-        return std::nullopt;
+        return std::nullopt;  // GetDocsDirByClientTik has told why
     }
     QString dir = folder;
     if (!o.innerFolder.isEmpty()) {
