@@ -73,7 +73,15 @@ int main(int argc, char** argv) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
     }
 
-    QApplication app(argc, argv);  // takes its own options (-platform ...) out of argv
+    // --batch shows no window: a core application starts without a platform plugin and the
+    // font configuration, which took half of its start-up. Otherwise QApplication, which
+    // takes its own options (-platform ...) out of argv.
+    std::unique_ptr<QCoreApplication> app;
+    if (early.batch && early.error.isEmpty()) {
+        app = std::make_unique<QCoreApplication>(argc, argv);
+    } else {
+        app = std::make_unique<QApplication>(argc, argv);
+    }
     const zv::CommandLine cl = zv::ParseCommandLine(Arguments(argc, argv));
     if (!cl.error.isEmpty()) {
         Print(stderr, QStringLiteral("zorvane-filer: ") + cl.error + QStringLiteral("\n") +
@@ -83,7 +91,9 @@ int main(int argc, char** argv) {
     if (AnswerInformation(cl, argv[0])) {
         return 0;
     }
-    PrepareHebrewUi(app);
+    if (auto* gui = qobject_cast<QApplication*>(app.get())) {
+        PrepareHebrewUi(*gui);
+    }
     if (cl.batch) {
         zv::SetUi(std::make_unique<zv::ConsoleUi>());
     } else {
