@@ -3,6 +3,7 @@
 #include <QDir>
 #include <QFile>
 #include <array>
+#include <cctype>
 #include <cmath>
 #include <filesystem>
 #include <system_error>
@@ -29,8 +30,20 @@ qsizetype LastSeparator(const QString& path) {
 // rounded to the nearest whole number; anything not numeric counts as 0.
 double NumberOf(const QString& name) {
     const qsizetype dot = name.lastIndexOf(QLatin1Char('.'));
-    const QString stem = dot > 0 ? name.left(dot) : name;
-    return std::nearbyint(GetDblFromStr(stem.mid(1)));
+    const qsizetype end = dot > 0 ? dot : name.size();
+    // The usual name, letter and plain digits, is read here: a folder of numbered files
+    // holds many thousands of them.
+    if (end > 1 && end <= 16) {
+        double n = 0;
+        qsizetype i = 1;
+        for (; i < end && name[i] >= QLatin1Char('0') && name[i] <= QLatin1Char('9'); ++i) {
+            n = n * 10 + (name[i].unicode() - '0');
+        }
+        if (i == end) {
+            return n;
+        }
+    }
+    return std::nearbyint(GetDblFromStr(name.mid(1, end - 1)));
 }
 
 bool EndsWithSeparator(const QString& path) {
@@ -74,9 +87,20 @@ QString GetNextFileName(const QString& folder, const QString& ext, const QString
                  }
                  throw MakeError(err::PathNotFound);
              }
+             // A one-character ASCII letter is compared on the raw name, so that only the
+             // names that start with it are decoded.
+             const char ascii = letter.size() == 1 && letter[0].unicode() < 0x80
+                                    ? char(letter[0].toUpper().unicode())
+                                    : '\0';
              double max = 0;
              for (const auto& entry : it) {
-                 const QString name = QFile::decodeName(entry.path().filename().c_str());
+                 const auto& native = entry.path().native();
+                 const auto base = native.find_last_of('/') + 1;
+                 if (ascii && (base >= native.size() ||
+                               std::toupper(static_cast<unsigned char>(native[base])) != ascii)) {
+                     continue;
+                 }
+                 const QString name = QFile::decodeName(native.c_str() + base);
                  if (!name.startsWith(letter, Qt::CaseInsensitive)) {
                      continue;
                  }

@@ -242,6 +242,16 @@ class TestFolderNaming : public QObject {
         QTest::newRow("dot first") << QStringList{"T.5"} << "DOC"
                                    << "T"
                                    << "T1.DOC";
+        // Plain digits are read directly; anything else as a number is read in general.
+        QTest::newRow("zeros, blanks, exponent, sixteen digits")
+            << QStringList{"T0099.doc", "T 150.doc", "T1e2.doc", "T1000000000000000.doc", "Ω7.doc"}
+            << "DOC"
+            << "T"
+            << "T1000000000000001.DOC";
+        QTest::newRow("zeros, blanks, exponent")
+            << QStringList{"T0099.doc", "T 150 .doc", "T1e2.doc", "ת500.doc"} << "DOC"
+            << "T"
+            << "T151.DOC";
     }
     void nextNumber() {
         QFETCH(QStringList, files);
