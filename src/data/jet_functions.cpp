@@ -2,8 +2,13 @@
 
 #include <sqlite3.h>
 
-#include <QVector>
+#include <QStringView>
+#include <algorithm>
 #include <cmath>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
 
 namespace zv {
 namespace {
@@ -25,60 +30,35 @@ double RadixVal(const QString& digits, int radix) {
     return v;
 }
 
-// One element of a pattern: a literal, any run, any one, a digit, or a class.
-struct PatternItem {
-    enum Kind { Literal, AnyRun, AnyOne, Digit, Class } kind;
-    QChar ch;
-    bool negated = false;
-    QVector<QPair<QChar, QChar>> ranges;
-};
-
-QVector<PatternItem> Compile(const QString& pattern, QChar escape) {
-    QVector<PatternItem> items;
-    for (qsizetype i = 0; i < pattern.size(); ++i) {
-        const QChar c = pattern.at(i);
-        if (!escape.isNull() && c == escape && i + 1 < pattern.size()) {
-            items.push_back({PatternItem::Literal, pattern.at(++i).toCaseFolded(), false, {}});
-        } else if (c == QLatin1Char('*')) {
-            items.push_back({PatternItem::AnyRun, {}, false, {}});
-        } else if (c == QLatin1Char('?')) {
-            items.push_back({PatternItem::AnyOne, {}, false, {}});
-        } else if (c == QLatin1Char('#')) {
-            items.push_back({PatternItem::Digit, {}, false, {}});
-        } else if (c == QLatin1Char('[') && pattern.indexOf(QLatin1Char(']'), i + 1) > i) {
-            const qsizetype close = pattern.indexOf(QLatin1Char(']'), i + 1);
-            QString body = pattern.mid(i + 1, close - i - 1);
-            PatternItem item{PatternItem::Class, {}, false, {}};
-            if (body.startsWith(QLatin1Char('!'))) {
-                item.negated = true;
-                body.remove(0, 1);
-            }
-            for (qsizetype k = 0; k < body.size(); ++k) {
-                const QChar from = body.at(k).toCaseFolded();
-                if (k + 2 < body.size() && body.at(k + 1) == QLatin1Char('-')) {
-                    item.ranges.push_back({from, body.at(k + 2).toCaseFolded()});
-                    k += 2;
-                } else {
-                    item.ranges.push_back({from, from});
-                }
-            }
-            items.push_back(item);
-            i = close;
-        } else {
-            items.push_back({PatternItem::Literal, c.toCaseFolded(), false, {}});
-        }
+// Case folding of one UTF-16 code unit, as QChar::toCaseFolded does it, without the table
+// look-up for the letters names are mostly made of. A surrogate folds to itself.
+inline char16_t Fold(char16_t c) {
+    if (c < 0x80) {
+        return c >= u'A' && c <= u'Z' ? static_cast<char16_t>(c + 0x20) : c;
     }
-    return items;
+    if (c >= 0x0590 && c <= 0x05FF) {  // Hebrew has no case
+        return c;
+    }
+    return static_cast<char16_t>(QChar::toCaseFolded(char32_t{c}));
 }
 
-bool MatchOne(const PatternItem& item, QChar c) {
+// One element of a pattern: a literal, any run, any one, a digit, or a class. Characters
+// are folded.
+struct PatternItem {
+    enum Kind { Literal, AnyRun, AnyOne, Digit, Class } kind;
+    char16_t ch = 0;
+    bool negated = false;
+    std::vector<std::pair<char16_t, char16_t>> ranges;
+};
+
+bool MatchOne(const PatternItem& item, char16_t c) {
     switch (item.kind) {
         case PatternItem::Literal:
             return item.ch == c;
         case PatternItem::AnyOne:
             return true;
         case PatternItem::Digit:
-            return c >= QLatin1Char('0') && c <= QLatin1Char('9');
+            return c >= u'0' && c <= u'9';
         case PatternItem::Class: {
             bool in = false;
             for (const auto& r : item.ranges) {
@@ -93,6 +73,153 @@ bool MatchOne(const PatternItem& item, QChar c) {
             break;
     }
     return false;
+}
+
+// A pattern compiled once and matched against many texts without copying them. Pattern
+// and text are folded one code unit at a time, so that a letter outside the basic plane
+// folds the same way on both sides.
+class LikePattern {
+  public:
+    LikePattern(QStringView pattern, char16_t escape);
+    char16_t Escape() const { return escape_; }
+    bool Matches(QStringView text) const;
+
+  private:
+    // The shapes a search box makes ("text", "text*", "*text", "*text*", "*"), matched
+    // against literal_ without the general loop.
+    enum class Shape { General, Exact, Prefix, Suffix, Contains, Anything };
+
+    bool SameFolded(const char16_t* t) const;
+    bool MatchGeneral(const char16_t* t, qsizetype n) const;
+
+    char16_t escape_;
+    std::vector<PatternItem> items_;
+    Shape shape_ = Shape::General;
+    std::u16string literal_;
+};
+
+LikePattern::LikePattern(QStringView pattern, char16_t escape) : escape_(escape) {
+    for (qsizetype i = 0; i < pattern.size(); ++i) {
+        const char16_t c = pattern.at(i).unicode();
+        if (escape != 0 && c == escape && i + 1 < pattern.size()) {
+            items_.push_back({PatternItem::Literal, Fold(pattern.at(++i).unicode()), false, {}});
+        } else if (c == u'*') {
+            // A run of stars means what one does.
+            if (items_.empty() || items_.back().kind != PatternItem::AnyRun) {
+                items_.push_back({PatternItem::AnyRun, 0, false, {}});
+            }
+        } else if (c == u'?') {
+            items_.push_back({PatternItem::AnyOne, 0, false, {}});
+        } else if (c == u'#') {
+            items_.push_back({PatternItem::Digit, 0, false, {}});
+        } else if (c == u'[' && pattern.indexOf(QLatin1Char(']'), i + 1) > i) {
+            const qsizetype close = pattern.indexOf(QLatin1Char(']'), i + 1);
+            QStringView body = pattern.mid(i + 1, close - i - 1);
+            PatternItem item{PatternItem::Class, 0, false, {}};
+            if (body.startsWith(QLatin1Char('!'))) {
+                item.negated = true;
+                body = body.mid(1);
+            }
+            for (qsizetype k = 0; k < body.size(); ++k) {
+                const char16_t from = Fold(body.at(k).unicode());
+                if (k + 2 < body.size() && body.at(k + 1) == QLatin1Char('-')) {
+                    item.ranges.push_back({from, Fold(body.at(k + 2).unicode())});
+                    k += 2;
+                } else {
+                    item.ranges.push_back({from, from});
+                }
+            }
+            items_.push_back(std::move(item));
+            i = close;
+        } else {
+            items_.push_back({PatternItem::Literal, Fold(c), false, {}});
+        }
+    }
+    const auto literal = [](const PatternItem& item) { return item.kind == PatternItem::Literal; };
+    const bool starFirst = !items_.empty() && items_.front().kind == PatternItem::AnyRun;
+    const bool starLast = !items_.empty() && items_.back().kind == PatternItem::AnyRun;
+    const auto first = items_.begin() + (starFirst ? 1 : 0);
+    const auto last = items_.end() - (starLast && items_.size() > 1 ? 1 : 0);
+    if (first > last || !std::all_of(first, last, literal)) {
+        return;
+    }
+    for (auto it = first; it != last; ++it) {
+        literal_.push_back(it->ch);
+    }
+    if (starFirst && literal_.empty()) {
+        shape_ = Shape::Anything;
+    } else if (starFirst) {
+        shape_ = starLast ? Shape::Contains : Shape::Suffix;
+    } else {
+        shape_ = starLast ? Shape::Prefix : Shape::Exact;
+    }
+}
+
+bool LikePattern::Matches(QStringView text) const {
+    const char16_t* t = text.utf16();
+    const qsizetype n = text.size();
+    const qsizetype m = static_cast<qsizetype>(literal_.size());
+    switch (shape_) {
+        case Shape::Anything:
+            return true;
+        case Shape::Exact:
+            return n == m && SameFolded(t);
+        case Shape::Prefix:
+            return n >= m && SameFolded(t);
+        case Shape::Suffix:
+            return n >= m && SameFolded(t + n - m);
+        case Shape::Contains:
+            for (qsizetype i = 0; i + m <= n; ++i) {
+                if (SameFolded(t + i)) {
+                    return true;
+                }
+            }
+            return false;
+        case Shape::General:
+            break;
+    }
+    return MatchGeneral(t, n);
+}
+
+bool LikePattern::SameFolded(const char16_t* t) const {
+    for (const char16_t c : literal_) {
+        if (Fold(*t++) != c) {
+            return false;
+        }
+    }
+    return true;
+}
+
+bool LikePattern::MatchGeneral(const char16_t* t, qsizetype n) const {
+    // Greedy match with one backtrack point for the last "*", linear in practice.
+    const qsizetype size = static_cast<qsizetype>(items_.size());
+    qsizetype p = 0, s = 0, starP = -1, starS = -1;
+    while (s < n) {
+        if (p < size && items_[p].kind == PatternItem::AnyRun) {
+            starP = p++;
+            starS = s;
+        } else if (p < size && MatchOne(items_[p], Fold(t[s]))) {
+            ++p;
+            ++s;
+        } else if (starP >= 0) {
+            p = starP + 1;
+            s = ++starS;
+        } else {
+            return false;
+        }
+    }
+    while (p < size && items_[p].kind == PatternItem::AnyRun) {
+        ++p;
+    }
+    return p == size;
+}
+
+// The UTF-16 text of a value as SQLite holds it, valid until the value changes. Null when
+// SQLite ran out of memory converting it.
+const char16_t* Text16(sqlite3_value* v, qsizetype* size) {
+    const auto* t = static_cast<const char16_t*>(sqlite3_value_text16(v));
+    *size = sqlite3_value_bytes16(v) / 2;
+    return t;
 }
 
 QString ValueText(sqlite3_value* v) {
@@ -123,22 +250,50 @@ void ValFunction(sqlite3_context* ctx, int, sqlite3_value** argv) {
     }
 }
 
-// SQLite calls like(pattern, text[, escape]) for "text LIKE pattern [ESCAPE e]".
+// SQLite calls like(pattern, text[, escape]) for "text LIKE pattern [ESCAPE e]". The
+// compiled pattern is kept with the statement while the pattern stays the same.
 void LikeFunction(sqlite3_context* ctx, int argc, sqlite3_value** argv) {
     if (sqlite3_value_type(argv[0]) == SQLITE_NULL || sqlite3_value_type(argv[1]) == SQLITE_NULL) {
         sqlite3_result_null(ctx);
         return;
     }
-    QChar escape;
+    char16_t escape = 0;
     if (argc == 3 && sqlite3_value_type(argv[2]) != SQLITE_NULL) {
-        const QString e = ValueText(argv[2]);
-        if (e.size() != 1) {
+        qsizetype size = 0;
+        const char16_t* e = Text16(argv[2], &size);
+        if (e == nullptr) {
+            sqlite3_result_error_nomem(ctx);
+            return;
+        }
+        if (size != 1) {
             sqlite3_result_error(ctx, "ESCAPE expression must be a single character", -1);
             return;
         }
-        escape = e.at(0);
+        escape = e[0];
     }
-    sqlite3_result_int(ctx, JetLike(ValueText(argv[0]), ValueText(argv[1]), escape) ? 1 : 0);
+    qsizetype size = 0;
+    const char16_t* text = Text16(argv[1], &size);
+    if (text == nullptr) {
+        sqlite3_result_error_nomem(ctx);
+        return;
+    }
+    const auto* kept = static_cast<const LikePattern*>(sqlite3_get_auxdata(ctx, 0));
+    if (kept != nullptr && kept->Escape() == escape) {
+        sqlite3_result_int(ctx, kept->Matches(QStringView(text, size)) ? 1 : 0);
+        return;
+    }
+    qsizetype patternSize = 0;
+    const char16_t* pattern = Text16(argv[0], &patternSize);
+    if (pattern == nullptr) {
+        sqlite3_result_error_nomem(ctx);
+        return;
+    }
+    auto compiled = std::make_unique<LikePattern>(QStringView(pattern, patternSize), escape);
+    sqlite3_result_int(ctx, compiled->Matches(QStringView(text, size)) ? 1 : 0);
+    // SQLite may delete it at once (a pattern that changes from row to row), so it is
+    // handed over last.
+    sqlite3_set_auxdata(ctx, 0, compiled.release(),
+                        [](void* p) { delete static_cast<LikePattern*>(p); });
 }
 
 }  // namespace
@@ -193,28 +348,7 @@ double JetVal(const QString& text) {
 }
 
 bool JetLike(const QString& pattern, const QString& text, QChar escape) {
-    const QVector<PatternItem> items = Compile(pattern, escape);
-    const QString t = text.toCaseFolded();
-    // Greedy match with one backtrack point for the last "*", linear in practice.
-    qsizetype p = 0, s = 0, starP = -1, starS = -1;
-    while (s < t.size()) {
-        if (p < items.size() && items[p].kind == PatternItem::AnyRun) {
-            starP = p++;
-            starS = s;
-        } else if (p < items.size() && MatchOne(items[p], t.at(s))) {
-            ++p;
-            ++s;
-        } else if (starP >= 0) {
-            p = starP + 1;
-            s = ++starS;
-        } else {
-            return false;
-        }
-    }
-    while (p < items.size() && items[p].kind == PatternItem::AnyRun) {
-        ++p;
-    }
-    return p == items.size();
+    return LikePattern(pattern, escape.unicode()).Matches(text);
 }
 
 int RegisterJetFunctions(sqlite3* db) {

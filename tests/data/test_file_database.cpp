@@ -57,6 +57,9 @@ class TestFileDatabase : public QObject {
     void deleteStar();
     void jetLike_data();
     void jetLike();
+    void jetLikeFoldsEveryCodeUnit();
+    void likeFunction_data();
+    void likeFunction();
     void jetVal_data();
     void jetVal();
     void booleansAndDates();
@@ -261,6 +264,42 @@ void TestFileDatabase::jetLike_data() {
                                       << "xaxbxcx" << true;
     QTest::newRow("empty pattern") << ""
                                    << "" << true;
+    QTest::newRow("empty pattern, some text") << ""
+                                              << "a" << false;
+    QTest::newRow("star, empty text") << "*"
+                                      << "" << true;
+    QTest::newRow("stars in a row") << "a**b"
+                                    << "ab" << true;
+    QTest::newRow("whole text, mixed case") << "ÀbÇ"
+                                            << "àBç" << true;
+    QTest::newRow("prefix, mixed case") << "o'NE*"
+                                        << "O'Neil" << true;
+    QTest::newRow("prefix longer than text") << "abcd*"
+                                             << "abc" << false;
+    QTest::newRow("suffix, mixed case") << "*NEIL"
+                                        << "O'Neil" << true;
+    QTest::newRow("suffix longer than text") << "*abc"
+                                             << "bc" << false;
+    QTest::newRow("contains at the end") << "*eIL*"
+                                         << "O'Neil" << true;
+    QTest::newRow("contains after a false start") << "*aab*"
+                                                  << "aaab" << true;
+    QTest::newRow("contains longer than text") << "*abc*"
+                                               << "ab" << false;
+    QTest::newRow("Hebrew prefix") << "כה*"
+                                   << "כהן" << true;
+    QTest::newRow("Hebrew final letter is its own") << "*כהנ*"
+                                                    << "כהן" << false;
+    QTest::newRow("Hebrew and Latin") << "*COHEN כהן*"
+                                      << "Cohen כהן 2" << true;
+    QTest::newRow("sign that folds to a Latin letter") << "*k*"
+                                                       << "5 \u212A" << true;
+    QTest::newRow("class inside stars") << "*[ab]*"
+                                        << "xBx" << true;
+    QTest::newRow("unclosed bracket is literal") << "*[a*"
+                                                 << "x[Ab" << true;
+    QTest::newRow("empty class matches nothing") << "*[]*"
+                                                 << "ab" << false;
 }
 
 void TestFileDatabase::jetLike() {
@@ -275,6 +314,72 @@ void TestFileDatabase::jetLike() {
     auto rs = db->OpenRecordset(QStringLiteral("SELECT ('%1' LIKE '%2') AS m")
                                     .arg(t.replace("'", "''"), p.replace("'", "''")));
     QCOMPARE(rs->Value(QStringLiteral("m")).toInt(), match ? 1 : 0);
+}
+
+void TestFileDatabase::jetLikeFoldsEveryCodeUnit() {
+    for (char32_t c = 0; c <= 0xFFFF; ++c) {
+        const QChar original(static_cast<char16_t>(c));
+        const QChar folded = original.toCaseFolded();
+        const QString escaped = QStringLiteral("!") + original;
+        QVERIFY2(JetLike(escaped, QString(folded), u'!'), qPrintable(QString::number(c, 16)));
+        QVERIFY2(JetLike(QStringLiteral("!") + folded, QString(original), u'!'),
+                 qPrintable(QString::number(c, 16)));
+    }
+}
+
+void TestFileDatabase::likeFunction_data() {
+    QTest::addColumn<QString>("sql");
+    QTest::addColumn<QString>("result");
+    QTest::newRow("NULL text") << "SELECT NULL LIKE 'a*'"
+                               << "NULL";
+    QTest::newRow("NULL pattern") << "SELECT 'a' LIKE NULL"
+                                  << "NULL";
+    QTest::newRow("escape") << "SELECT 'a*' LIKE 'a!*' ESCAPE '!', 'ab' LIKE 'a!*' ESCAPE '!'"
+                            << "1,0";
+    QTest::newRow("NULL escape is none") << "SELECT 'a!b' LIKE 'a!*' ESCAPE NULL"
+                                         << "1";
+    QTest::newRow("escape of two characters") << "SELECT 'a' LIKE 'a' ESCAPE '!!'"
+                                              << "ESCAPE expression must be a single character";
+    QTest::newRow("number as text") << "SELECT 12345 LIKE '*34*'"
+                                    << "1";
+    QTest::newRow("same pattern on every row") << "SELECT t LIKE '*B*' FROM r"
+                                               << "1,0,1,0";
+    QTest::newRow("pattern of each row") << "SELECT t LIKE p FROM r"
+                                         << "1,0,1,0";
+    QTest::newRow("escape of each row") << "SELECT t LIKE 'a!*' ESCAPE e FROM r"
+                                        << "0,0,0,1";
+}
+
+// The registered function straight on a connection: NULLs, the escape, and a pattern
+// kept from row to row only while it stays the same.
+void TestFileDatabase::likeFunction() {
+    QFETCH(QString, sql);
+    QFETCH(QString, result);
+    sqlite3* db = nullptr;
+    QCOMPARE(sqlite3_open(":memory:", &db), SQLITE_OK);
+    const std::unique_ptr<sqlite3, int (*)(sqlite3*)> closer(db, sqlite3_close);
+    QCOMPARE(RegisterJetFunctions(db), SQLITE_OK);
+    QCOMPARE(sqlite3_exec(db,
+                          "CREATE TABLE r (t, p, e); INSERT INTO r VALUES ('abc', 'a*', '!'), "
+                          "('a*', '*x*', '#'), ('ABC', '*b*', '!'), ('a!x', '', '#')",
+                          nullptr, nullptr, nullptr),
+             SQLITE_OK);
+    sqlite3_stmt* stmt = nullptr;
+    QCOMPARE(sqlite3_prepare_v2(db, sql.toUtf8().constData(), -1, &stmt, nullptr), SQLITE_OK);
+    QStringList values;
+    int rc = SQLITE_ROW;
+    while ((rc = sqlite3_step(stmt)) == SQLITE_ROW) {
+        for (int i = 0; i < sqlite3_column_count(stmt); ++i) {
+            values << (sqlite3_column_type(stmt, i) == SQLITE_NULL
+                           ? QStringLiteral("NULL")
+                           : QString::number(sqlite3_column_int(stmt, i)));
+        }
+    }
+    if (rc != SQLITE_DONE) {
+        values << QString::fromUtf8(sqlite3_errmsg(db));
+    }
+    sqlite3_finalize(stmt);
+    QCOMPARE(values.join(QLatin1Char(',')), result);
 }
 
 void TestFileDatabase::jetVal_data() {
