@@ -177,7 +177,7 @@ void TestBackendSelection::flagsFromRow_data() {
     QTest::addColumn<QString>("rowOf");
     QTest::addColumn<QVariantList>("row");
     QTest::addColumn<QString>("flags");
-    const QVariant null(QMetaType(QMetaType::Int));
+    const QVariant null{QMetaType(QMetaType::Int)};
     QTest::newRow("clients on the server only") << "23"
                                                 << "23" << QVariantList{0, 0, 1, 0} << "--O-";
     QTest::newRow("documents and reminders") << "23"
