@@ -100,10 +100,22 @@ int main(int argc, char** argv) {
         zv::SetUi(std::make_unique<zv::QtUi>());
     }
     QString archived;
+    bool usageError = false;
     const int status =
         zv::Main(zv::DecodeArgumentText(cl.request), [&](int& mode, QString& path, QString& name) {
+            // Checked only for a request that passed Main's checks, so that a missing
+            // installation is reported as such also in batch runs.
+            if (cl.batch && cl.filing.client.isEmpty()) {
+                Print(stderr, QStringLiteral("zorvane-filer: --batch needs --client\n") +
+                                  zv::UsageText(QString::fromLocal8Bit(argv[0])));
+                usageError = true;
+                return;
+            }
             archived = zv::HandleFilingRequest(cl, mode, path, name);
         });
+    if (usageError) {
+        return 2;
+    }
     if (!cl.batch || status != 0) {
         return status;
     }

@@ -127,9 +127,6 @@ QString CheckFilingOptions(bool batch, const FilingOptions& options) {
     if (!batch) {
         return {};
     }
-    if (options.client.isEmpty()) {
-        return QStringLiteral("--batch needs --client");
-    }
     if (options.popup && !options.reminderDate) {
         return QStringLiteral("--popup needs --reminder");
     }

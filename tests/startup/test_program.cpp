@@ -91,7 +91,7 @@ void TestProgram::refusals() {
         test::MakeInstallation(env, setup == 2);
     }
     expected.replace(QStringLiteral("%M"), env.DataDir());
-    const Result r = RunProgram({"--batch", "--client", "1001", request}, env);
+    const Result r = RunProgram({"--batch", request}, env);
     QCOMPARE(r.status, 1);
     QVERIFY2(r.err.endsWith(expected), qPrintable(r.err));
 }
