@@ -1,12 +1,14 @@
 #include "filing_dialog/file_naming.h"
 
+#include <dirent.h>
+#include <sys/stat.h>
+
 #include <QDir>
 #include <QFile>
 #include <array>
 #include <cctype>
 #include <cmath>
-#include <filesystem>
-#include <system_error>
+#include <memory>
 
 #include "data/values.h"
 #include "util/errors.h"
@@ -50,6 +52,16 @@ bool EndsWithSeparator(const QString& path) {
     return !path.isEmpty() && IsSeparator(path.back());
 }
 
+// Whether a listed entry is a file, a link to one included; the listing's own kind is used
+// where it has one.
+bool IsRegularFile(const QByteArray& dir, const dirent& entry) {
+    if (entry.d_type != DT_UNKNOWN && entry.d_type != DT_LNK) {
+        return entry.d_type == DT_REG;
+    }
+    struct stat st {};
+    return ::stat((dir + '/' + entry.d_name).constData(), &st) == 0 && S_ISREG(st.st_mode);
+}
+
 }  // namespace
 
 QString CCpath(const QString& path) {
@@ -76,10 +88,10 @@ QString GetNextFileName(const QString& folder, const QString& ext, const QString
              BuildDirTree(dir);
              // One pass over the names; the entry kind comes from the directory listing itself,
              // and only names starting with the letter are looked at further.
-             std::error_code ec;
-             std::filesystem::directory_iterator it(QFile::encodeName(DiskPath(dir)).toStdString(),
-                                                    ec);
-             if (ec) {
+             const QByteArray diskDir = QFile::encodeName(DiskPath(dir));
+             const std::unique_ptr<DIR, int (*)(DIR*)> listing(::opendir(diskDir.constData()),
+                                                               &::closedir);
+             if (!listing) {
                  if (IsDevelopmentRun()) {
                      MsgBox(QStringLiteral("בעיה בהגדרת אוביקט קריאת נתוני ספריה") +
                                 QStringLiteral("\r\n") + dir,
@@ -93,19 +105,15 @@ QString GetNextFileName(const QString& folder, const QString& ext, const QString
                                     ? char(letter[0].toUpper().unicode())
                                     : '\0';
              double max = 0;
-             for (const auto& entry : it) {
-                 const auto& native = entry.path().native();
-                 const auto base = native.find_last_of('/') + 1;
-                 if (ascii && (base >= native.size() ||
-                               std::toupper(static_cast<unsigned char>(native[base])) != ascii)) {
+             while (const dirent* entry = ::readdir(listing.get())) {
+                 if (ascii && std::toupper(static_cast<unsigned char>(entry->d_name[0])) != ascii) {
                      continue;
                  }
-                 const QString name = QFile::decodeName(native.c_str() + base);
+                 const QString name = QFile::decodeName(entry->d_name);
                  if (!name.startsWith(letter, Qt::CaseInsensitive)) {
                      continue;
                  }
-                 std::error_code typeError;
-                 if (!entry.is_regular_file(typeError)) {
+                 if (!IsRegularFile(diskDir, *entry)) {
                      continue;
                  }
                  max = std::max(max, NumberOf(name));
