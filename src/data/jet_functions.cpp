@@ -4,8 +4,10 @@
 
 #include <QStringView>
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -222,6 +224,59 @@ const char16_t* Text16(sqlite3_value* v, qsizetype* size) {
     return t;
 }
 
+// A value's UTF-8 text as UTF-16 in units, when it is short, well-formed and within the
+// basic plane; its length, or -1 for anything else, which is left to SQLite's own
+// conversion (a malformed byte would otherwise be read differently).
+qsizetype Utf8ToUtf16(const unsigned char* p, qsizetype n, std::array<char16_t, 256>& units) {
+    if (n > static_cast<qsizetype>(units.size())) {
+        return -1;
+    }
+    const unsigned char* end = p + n;
+    qsizetype size = 0;
+    while (p < end) {
+        const unsigned c = *p;
+        if (c < 0x80) {
+            units[size++] = static_cast<char16_t>(c);
+            ++p;
+        } else if (c >= 0xC2 && c <= 0xDF && end - p >= 2 && (p[1] & 0xC0) == 0x80) {
+            units[size++] = static_cast<char16_t>(((c & 0x1F) << 6) | (p[1] & 0x3F));
+            p += 2;
+        } else if (c >= 0xE0 && c <= 0xEF && end - p >= 3 && (p[1] & 0xC0) == 0x80 &&
+                   (p[2] & 0xC0) == 0x80) {
+            const unsigned u = ((c & 0x0F) << 12) | ((p[1] & 0x3F) << 6) | (p[2] & 0x3F);
+            // Overlong forms, surrogates and the two non-characters SQLite replaces.
+            if (u < 0x800 || (u >= 0xD800 && u <= 0xDFFF) || u >= 0xFFFE) {
+                return -1;
+            }
+            units[size++] = static_cast<char16_t>(u);
+            p += 3;
+        } else {
+            return -1;
+        }
+    }
+    return size;
+}
+
+// Matches a value's text, read as stored when that spares SQLite the conversion to
+// UTF-16. Empty when SQLite ran out of memory.
+std::optional<bool> MatchValue(const LikePattern& pattern, sqlite3_value* v) {
+    const unsigned char* bytes = sqlite3_value_text(v);
+    if (bytes == nullptr) {
+        return std::nullopt;
+    }
+    std::array<char16_t, 256> units;
+    const qsizetype converted = Utf8ToUtf16(bytes, sqlite3_value_bytes(v), units);
+    if (converted >= 0) {
+        return pattern.Matches(QStringView(units.data(), converted));
+    }
+    qsizetype size = 0;
+    const char16_t* text = Text16(v, &size);
+    if (text == nullptr) {
+        return std::nullopt;
+    }
+    return pattern.Matches(QStringView(text, size));
+}
+
 QString ValueText(sqlite3_value* v) {
     const void* t = sqlite3_value_text16(v);
     const int bytes = sqlite3_value_bytes16(v);
@@ -271,29 +326,30 @@ void LikeFunction(sqlite3_context* ctx, int argc, sqlite3_value** argv) {
         }
         escape = e[0];
     }
-    qsizetype size = 0;
-    const char16_t* text = Text16(argv[1], &size);
-    if (text == nullptr) {
-        sqlite3_result_error_nomem(ctx);
-        return;
-    }
     const auto* kept = static_cast<const LikePattern*>(sqlite3_get_auxdata(ctx, 0));
-    if (kept != nullptr && kept->Escape() == escape) {
-        sqlite3_result_int(ctx, kept->Matches(QStringView(text, size)) ? 1 : 0);
-        return;
+    std::unique_ptr<LikePattern> compiled;
+    if (kept == nullptr || kept->Escape() != escape) {
+        qsizetype size = 0;
+        const char16_t* pattern = Text16(argv[0], &size);
+        if (pattern == nullptr) {
+            sqlite3_result_error_nomem(ctx);
+            return;
+        }
+        compiled = std::make_unique<LikePattern>(QStringView(pattern, size), escape);
+        kept = compiled.get();
     }
-    qsizetype patternSize = 0;
-    const char16_t* pattern = Text16(argv[0], &patternSize);
-    if (pattern == nullptr) {
+    const std::optional<bool> match = MatchValue(*kept, argv[1]);
+    if (!match) {
         sqlite3_result_error_nomem(ctx);
         return;
     }
-    auto compiled = std::make_unique<LikePattern>(QStringView(pattern, patternSize), escape);
-    sqlite3_result_int(ctx, compiled->Matches(QStringView(text, size)) ? 1 : 0);
-    // SQLite may delete it at once (a pattern that changes from row to row), so it is
-    // handed over last.
-    sqlite3_set_auxdata(ctx, 0, compiled.release(),
-                        [](void* p) { delete static_cast<LikePattern*>(p); });
+    sqlite3_result_int(ctx, *match ? 1 : 0);
+    if (compiled) {
+        // SQLite may delete it at once (a pattern that changes from row to row), so it is
+        // handed over last.
+        sqlite3_set_auxdata(ctx, 0, compiled.release(),
+                            [](void* p) { delete static_cast<LikePattern*>(p); });
+    }
 }
 
 }  // namespace
