@@ -264,6 +264,8 @@ void TestFileDatabase::jetLike_data() {
                                       << "xaxbxcx" << true;
     QTest::newRow("empty pattern") << ""
                                    << "" << true;
+    QTest::newRow("letter outside the basic plane") << "\U00010410*"
+                                                    << "\U00010410x" << true;
     QTest::newRow("empty pattern, some text") << ""
                                               << "a" << false;
     QTest::newRow("star, empty text") << "*"
