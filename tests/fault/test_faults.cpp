@@ -99,7 +99,8 @@ void TestFaults::withDialog_data() {
     const QString notRecorded = QStringLiteral("המסמך לא נרשם במערכת, קובץ המקור נשאר במקומו :");
     // Root writes through permissions; the immutable attribute stops it.
     QTest::newRow("target folder immutable")
-        << int(TargetImmutable) << QStringLiteral("70-0-WorkWithStr-") << QByteArray("document");
+        << int(TargetImmutable) << QStringLiteral("70-0-WorkWithStr-Permission denied")
+        << QByteArray("document");
     QTest::newRow("MDOCS.MDB missing")
         << int(DocsDbMissing) << notRecorded << QByteArray("document");
     QTest::newRow("MDOCS.MDB immutable")
@@ -109,7 +110,8 @@ void TestFaults::withDialog_data() {
     QTest::newRow("source deleted after the dialog")
         << int(SourceDeleted) << QStringLiteral("53-0-WorkWithStr-File not found") << QByteArray();
     QTest::newRow("source replaced by a folder after the dialog")
-        << int(SourceIsFolder) << QString() << QByteArray();
+        << int(SourceIsFolder) << QStringLiteral("75-0-WorkWithStr-Path/File access error")
+        << QByteArray();
     QTest::newRow("DOCS without the column FULLNAME")
         << int(DocsColumnMissing) << notRecorded << QByteArray("document");
 }
