@@ -94,26 +94,38 @@ void TestFaults::initTestCase() {
 
 void TestFaults::withDialog_data() {
     QTest::addColumn<int>("fault");
-    QTest::addColumn<QString>("message");  // the message's beginning
+    QTest::addColumn<QString>("message");  // the message's beginning; %1 the source
     QTest::addColumn<QByteArray>("sourceLeft");
-    const QString notRecorded = QStringLiteral("המסמך לא נרשם במערכת, קובץ המקור נשאר במקומו :");
+    // What became of the document, then why.
+    const QString notRecorded =
+        QStringLiteral("המסמך לא נרשם במערכת, קובץ המקור נשאר במקומו :\r\n%1\r\n\r\n");
     // Root writes through permissions; the immutable attribute stops it.
     QTest::newRow("target folder immutable")
         << int(TargetImmutable) << QStringLiteral("70-0-WorkWithStr-Permission denied")
         << QByteArray("document");
     QTest::newRow("MDOCS.MDB missing")
-        << int(DocsDbMissing) << notRecorded << QByteArray("document");
+        << int(DocsDbMissing)
+        << notRecorded + QStringLiteral("3024-0-AddDocToListByAddIn-Could not find file")
+        << QByteArray("document");
     QTest::newRow("MDOCS.MDB immutable")
-        << int(DocsDbImmutable) << notRecorded << QByteArray("document");
+        << int(DocsDbImmutable)
+        << notRecorded +
+               QStringLiteral("3027-0-GUpdate-Cannot update. Database or object is read-only.")
+        << QByteArray("document");
     QTest::newRow("MDOCS.MDB locked past the busy timeout")
-        << int(DocsDbLocked) << notRecorded << QByteArray("document");
+        << int(DocsDbLocked)
+        << notRecorded +
+               QStringLiteral("3260-0-AddDocToListByAddIn-Couldn't update; currently locked.")
+        << QByteArray("document");
     QTest::newRow("source deleted after the dialog")
         << int(SourceDeleted) << QStringLiteral("53-0-WorkWithStr-File not found") << QByteArray();
     QTest::newRow("source replaced by a folder after the dialog")
         << int(SourceIsFolder) << QStringLiteral("75-0-WorkWithStr-Path/File access error")
         << QByteArray();
     QTest::newRow("DOCS without the column FULLNAME")
-        << int(DocsColumnMissing) << notRecorded << QByteArray("document");
+        << int(DocsColumnMissing)
+        << notRecorded + QStringLiteral("3146-0-AddDocToListByAddIn-no such column: FullName")
+        << QByteArray("document");
 }
 
 void TestFaults::withDialog() {
@@ -193,7 +205,8 @@ void TestFaults::withDialog() {
     ZV_VERIFY_NOT_FILED(f, before, source, sourceLeft);
     QCOMPARE(f.Ui().UnexpectedModals(), 0);
     QVERIFY2(texts.size() == 1, shown.constData());
-    QVERIFY2(texts.front().startsWith(message), shown.constData());
+    QVERIFY2(texts.front().startsWith(QString(message).replace(QStringLiteral("%1"), source)),
+             shown.constData());
 }
 
 void TestFaults::batch_data() {
