@@ -1,6 +1,6 @@
 #pragma once
-// Ends the test program when one test runs past its time, so that a window left waiting
-// for input cannot hang the suite.
+// Ends the test program when a test runs past its time, so that a window left waiting for
+// input cannot hang the suite.
 
 #include <chrono>
 #include <condition_variable>
@@ -11,7 +11,7 @@ namespace zv::test {
 
 class Watchdog {
   public:
-    explicit Watchdog(std::chrono::seconds limit);
+    explicit Watchdog(std::chrono::seconds limit = std::chrono::seconds(20));
     ~Watchdog();
     Watchdog(const Watchdog&) = delete;
     Watchdog& operator=(const Watchdog&) = delete;
