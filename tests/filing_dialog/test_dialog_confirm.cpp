@@ -21,6 +21,7 @@
 #include "util/keyboard_layout.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 using zv::test::DialogFixture;
 
 namespace {
@@ -47,8 +48,8 @@ class TestDialogConfirm : public QObject {
   private slots:
     void noClientFirst_data() {
         QTest::addColumn<QString>("name");
-        QTest::newRow("with a name") << "מכתב";
-        QTest::newRow("without a name") << "";
+        QTest::newRow("with a name") << u"מכתב"_s;
+        QTest::newRow("without a name") << u""_s;
     }
     void noClientFirst() {
         QFETCH(QString, name);
@@ -84,10 +85,11 @@ class TestDialogConfirm : public QObject {
         QTest::addColumn<int>("answer");
         QTest::addColumn<bool>("asked");
         QTest::addColumn<bool>("confirmed");
-        QTest::newRow("no") << "מכתב ללקוח" << int(vbNo) << true << false;
-        QTest::newRow("yes") << "מכתב ללקוח" << int(vbYes) << true << true;
-        QTest::newRow("same name with extension") << "מכתב ללקוח.doc" << int(vbNo) << false << true;
-        QTest::newRow("no file") << "" << int(vbNo) << false << true;
+        QTest::newRow("no") << u"מכתב ללקוח"_s << int(vbNo) << true << false;
+        QTest::newRow("yes") << u"מכתב ללקוח"_s << int(vbYes) << true << true;
+        QTest::newRow("same name with extension")
+            << u"מכתב ללקוח.doc"_s << int(vbNo) << false << true;
+        QTest::newRow("no file") << u""_s << int(vbNo) << false << true;
     }
     void existingFile() {
         QFETCH(QString, existing);
@@ -158,10 +160,10 @@ class TestDialogConfirm : public QObject {
     void unlockCreationDate_data() {
         QTest::addColumn<QString>("code");  // "-": the prompt is closed
         QTest::addColumn<bool>("unlocked");
-        QTest::newRow("right code") << "5382" << true;
-        QTest::newRow("wrong code") << "1234" << false;
-        QTest::newRow("code with more") << "53820" << false;
-        QTest::newRow("cancelled") << "-" << false;
+        QTest::newRow("right code") << u"5382"_s << true;
+        QTest::newRow("wrong code") << u"1234"_s << false;
+        QTest::newRow("code with more") << u"53820"_s << false;
+        QTest::newRow("cancelled") << u"-"_s << false;
     }
     void unlockCreationDate() {
         QFETCH(QString, code);
@@ -199,9 +201,9 @@ class TestDialogConfirm : public QObject {
     void handlerPicker_data() {
         QTest::addColumn<QStringList>("pick");  // "-": the picker is closed
         QTest::addColumn<QString>("shown");
-        QTest::newRow("two users") << QStringList{"יוסי לוי", "מיכל ברק"} << "יוסי לוי;מיכל ברק";
-        QTest::newRow("nobody") << QStringList{} << "דנה כהן";
-        QTest::newRow("closed") << QStringList{"-"} << "משה לוי";
+        QTest::newRow("two users") << QStringList{"יוסי לוי", "מיכל ברק"} << u"יוסי לוי;מיכל ברק"_s;
+        QTest::newRow("nobody") << QStringList{} << u"דנה כהן"_s;
+        QTest::newRow("closed") << QStringList{"-"} << u"משה לוי"_s;
     }
     void handlerPicker() {
         QFETCH(QStringList, pick);
@@ -255,24 +257,15 @@ class TestDialogConfirm : public QObject {
         QTest::addColumn<QString>("control");
         QTest::addColumn<QString>("typed");
         QTest::addColumn<bool>("changes");
-        QTest::newRow("date: letter") << "TDate"
-                                      << "a" << false;
-        QTest::newRow("date: space") << "TDateRecieved"
-                                     << " " << false;
-        QTest::newRow("date: digit") << "TDateMemo"
-                                     << "3" << true;
-        QTest::newRow("time: letter") << "TDBTime1"
-                                      << "a" << false;
-        QTest::newRow("time: space") << "TDBTime1"
-                                     << " " << false;
-        QTest::newRow("time: backspace") << "TDBTime1"
-                                         << "\b" << false;
-        QTest::newRow("time: slash") << "TDBTime1"
-                                     << "/" << false;
-        QTest::newRow("time: digit") << "TDBTime1"
-                                     << "9" << true;
-        QTest::newRow("time: colon") << "TDBTime1"
-                                     << ":" << true;
+        QTest::newRow("date: letter") << u"TDate"_s << u"a"_s << false;
+        QTest::newRow("date: space") << u"TDateRecieved"_s << u" "_s << false;
+        QTest::newRow("date: digit") << u"TDateMemo"_s << u"3"_s << true;
+        QTest::newRow("time: letter") << u"TDBTime1"_s << u"a"_s << false;
+        QTest::newRow("time: space") << u"TDBTime1"_s << u" "_s << false;
+        QTest::newRow("time: backspace") << u"TDBTime1"_s << u"\b"_s << false;
+        QTest::newRow("time: slash") << u"TDBTime1"_s << u"/"_s << false;
+        QTest::newRow("time: digit") << u"TDBTime1"_s << u"9"_s << true;
+        QTest::newRow("time: colon") << u"TDBTime1"_s << u":"_s << true;
     }
     void inputFilters() {
         QFETCH(QString, control);
@@ -313,20 +306,13 @@ class TestDialogConfirm : public QObject {
     void forbiddenNameChars_data() {
         QTest::addColumn<QString>("how");
         QTest::addColumn<QString>("input");
-        QTest::newRow("typed colon") << "type"
-                                     << ":";
-        QTest::newRow("typed backslash") << "type"
-                                         << "\\";
-        QTest::newRow("typed slash") << "type"
-                                     << "/";
-        QTest::newRow("pasted path") << "paste"
-                                     << "..\\..\\x";
-        QTest::newRow("pasted slash") << "paste"
-                                      << "a/b";
-        QTest::newRow("dropped colon") << "drop"
-                                       << "c:x";
-        QTest::newRow("dropped quote") << "drop"
-                                       << "a\"b";
+        QTest::newRow("typed colon") << u"type"_s << u":"_s;
+        QTest::newRow("typed backslash") << u"type"_s << u"\\"_s;
+        QTest::newRow("typed slash") << u"type"_s << u"/"_s;
+        QTest::newRow("pasted path") << u"paste"_s << u"..\\..\\x"_s;
+        QTest::newRow("pasted slash") << u"paste"_s << u"a/b"_s;
+        QTest::newRow("dropped colon") << u"drop"_s << u"c:x"_s;
+        QTest::newRow("dropped quote") << u"drop"_s << u"a\"b"_s;
     }
     void forbiddenNameChars() {
         QFETCH(QString, how);
@@ -378,12 +364,9 @@ class TestDialogConfirm : public QObject {
     void hebrewKeyboardOnFocus_data() {
         QTest::addColumn<QString>("control");
         QTest::addColumn<QString>("layout");
-        QTest::newRow("name") << "TxtTeur"
-                              << "0000040D";
-        QTest::newRow("remark") << "TxtRemark"
-                                << "0000040D";
-        QTest::newRow("time") << "TDBTime1"
-                              << "00000409";
+        QTest::newRow("name") << u"TxtTeur"_s << u"0000040D"_s;
+        QTest::newRow("remark") << u"TxtRemark"_s << u"0000040D"_s;
+        QTest::newRow("time") << u"TDBTime1"_s << u"00000409"_s;
     }
     void hebrewKeyboardOnFocus() {
         QFETCH(QString, control);

@@ -16,6 +16,7 @@
 #include "util/settings_store.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 using zv::test::DialogFixture;
 
 namespace {
@@ -133,16 +134,11 @@ class TestDialogLoad : public QObject {
         QTest::addColumn<QString>("statusText");
         QTest::addColumn<QString>("originText");
         QTest::addColumn<bool>("originLocked");
-        QTest::newRow("status 3, origin 5") << 3 << 5 << "3 - סגור"
-                                            << "5 - סריקה" << true;
-        QTest::newRow("origin 10") << 0 << 10 << "2 - בטיפול"
-                                   << "10 - אחר" << true;
-        QTest::newRow("unknown status") << 9 << 0 << ""
-                                        << "1 - דואר" << false;
-        QTest::newRow("unknown origin") << 1 << 99 << "1 - חדש"
-                                        << "" << false;
-        QTest::newRow("negative origin") << 1 << -4 << "1 - חדש"
-                                         << "1 - דואר" << false;
+        QTest::newRow("status 3, origin 5") << 3 << 5 << u"3 - סגור"_s << u"5 - סריקה"_s << true;
+        QTest::newRow("origin 10") << 0 << 10 << u"2 - בטיפול"_s << u"10 - אחר"_s << true;
+        QTest::newRow("unknown status") << 9 << 0 << u""_s << u"1 - דואר"_s << false;
+        QTest::newRow("unknown origin") << 1 << 99 << u"1 - חדש"_s << u""_s << false;
+        QTest::newRow("negative origin") << 1 << -4 << u"1 - חדש"_s << u"1 - דואר"_s << false;
     }
     void presets() {
         QFETCH(int, status);
@@ -170,9 +166,9 @@ class TestDialogLoad : public QObject {
     void catalogue_data() {
         QTest::addColumn<QString>("change");
         QTest::addColumn<int>("messages");
-        QTest::newRow("no user kinds") << "DELETE FROM MTIK" << 0;
-        QTest::newRow("none shown") << "UPDATE MTIK SET SHOW=0" << 0;
-        QTest::newRow("no table") << "DROP TABLE MTIK" << 1;
+        QTest::newRow("no user kinds") << u"DELETE FROM MTIK"_s << 0;
+        QTest::newRow("none shown") << u"UPDATE MTIK SET SHOW=0"_s << 0;
+        QTest::newRow("no table") << u"DROP TABLE MTIK"_s << 1;
     }
     void catalogue() {
         QFETCH(QString, change);
@@ -219,16 +215,11 @@ class TestDialogLoad : public QObject {
     void startFolder_data() {
         QTest::addColumn<QString>("start");     // below the data folder; "-" outside it
         QTest::addColumn<QString>("selected");  // below the data folder
-        QTest::newRow("empty") << ""
-                               << "DOCS/MAILIN";
-        QTest::newRow("inside the archive") << "DOCS/DOC1001"
-                                            << "DOCS/DOC1001";
-        QTest::newRow("the archive itself") << "DOCS"
-                                            << "DOCS";
-        QTest::newRow("outside the archive") << "-"
-                                             << "DOCS/MAILIN";
-        QTest::newRow("data folder") << "Def"
-                                     << "DOCS/MAILIN";
+        QTest::newRow("empty") << u""_s << u"DOCS/MAILIN"_s;
+        QTest::newRow("inside the archive") << u"DOCS/DOC1001"_s << u"DOCS/DOC1001"_s;
+        QTest::newRow("the archive itself") << u"DOCS"_s << u"DOCS"_s;
+        QTest::newRow("outside the archive") << u"-"_s << u"DOCS/MAILIN"_s;
+        QTest::newRow("data folder") << u"Def"_s << u"DOCS/MAILIN"_s;
     }
     void startFolder() {
         QFETCH(QString, start);
@@ -251,10 +242,8 @@ class TestDialogLoad : public QObject {
     void handlerShown_data() {
         QTest::addColumn<QString>("preset");
         QTest::addColumn<QString>("shown");
-        QTest::newRow("the user") << ""
-                                  << "דנה כהן";
-        QTest::newRow("the caller's") << "משה לוי;רות כהן"
-                                      << "משה לוי;רות כהן";
+        QTest::newRow("the user") << u""_s << u"דנה כהן"_s;
+        QTest::newRow("the caller's") << u"משה לוי;רות כהן"_s << u"משה לוי;רות כהן"_s;
     }
     void handlerShown() {
         QFETCH(QString, preset);
@@ -283,12 +272,9 @@ class TestDialogLoad : public QObject {
     void fileNameCreatesItsFolders_data() {
         QTest::addColumn<QString>("name");    // below the data folder
         QTest::addColumn<QString>("folder");  // what must exist afterwards; empty: nothing new
-        QTest::newRow("new folders") << "DOCS/A/ב/name"
-                                     << "DOCS/A/ב";
-        QTest::newRow("backslashes") << "DOCS\\C\\D\\name"
-                                     << "DOCS/C/D";
-        QTest::newRow("no separator") << ""
-                                      << "";
+        QTest::newRow("new folders") << u"DOCS/A/ב/name"_s << u"DOCS/A/ב"_s;
+        QTest::newRow("backslashes") << u"DOCS\\C\\D\\name"_s << u"DOCS/C/D"_s;
+        QTest::newRow("no separator") << u""_s << u""_s;
     }
     void fileNameCreatesItsFolders() {
         QFETCH(QString, name);

@@ -13,6 +13,7 @@
 #include "filing_dialog/folder_view.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 using zv::test::DialogFixture;
 
 namespace {
@@ -76,36 +77,13 @@ class TestDialogNaming : public QObject {
         QTest::addColumn<QString>("caseNum");
         QTest::addColumn<QString>("caseCode");
         QTest::addColumn<QString>("folder");  // below DOCS; empty: DOCS itself
-        QTest::newRow("client") << "1001"
-                                << "F"
-                                << ""
-                                << ""
-                                << ""
-                                << "DOC1001";
-        QTest::newRow("case") << "5"
-                              << "W"
-                              << ""
-                              << "9"
-                              << "W-9"
-                              << "DOC5/W/9";
-        QTest::newRow("bureau, no client") << ""
-                                           << "L"
-                                           << ""
-                                           << "3"
-                                           << "12-34"
-                                           << "DOC00000/L/1234";
-        QTest::newRow("general case") << "5"
-                                      << "T"
-                                      << "27"
-                                      << "9"
-                                      << "9"
-                                      << "DOC5/27/9";
-        QTest::newRow("no rule") << "5"
-                                 << "FS"
-                                 << ""
-                                 << ""
-                                 << ""
-                                 << "";
+        QTest::newRow("client") << u"1001"_s << u"F"_s << u""_s << u""_s << u""_s << u"DOC1001"_s;
+        QTest::newRow("case") << u"5"_s << u"W"_s << u""_s << u"9"_s << u"W-9"_s << u"DOC5/W/9"_s;
+        QTest::newRow("bureau, no client")
+            << u""_s << u"L"_s << u""_s << u"3"_s << u"12-34"_s << u"DOC00000/L/1234"_s;
+        QTest::newRow("general case")
+            << u"5"_s << u"T"_s << u"27"_s << u"9"_s << u"9"_s << u"DOC5/27/9"_s;
+        QTest::newRow("no rule") << u"5"_s << u"FS"_s << u""_s << u""_s << u""_s << u""_s;
     }
     void folderFollowsTheChoice() {
         QFETCH(QString, client);
@@ -252,11 +230,11 @@ class TestDialogNaming : public QObject {
         QTest::addColumn<QString>("ext");
         QTest::addColumn<bool>("useInner");
         QTest::addColumn<QString>("name");
-        QTest::newRow("doc") << "doc" << false << "T13";
-        QTest::newRow("doc, inner folder") << "doc" << true << "T13";
-        QTest::newRow("pdf") << "pdf" << false << "S8";
-        QTest::newRow("mail") << "eml" << false << "E1";
-        QTest::newRow("unknown extension") << "xlsx" << false << "מכתב ללקוח";
+        QTest::newRow("doc") << u"doc"_s << false << u"T13"_s;
+        QTest::newRow("doc, inner folder") << u"doc"_s << true << u"T13"_s;
+        QTest::newRow("pdf") << u"pdf"_s << false << u"S8"_s;
+        QTest::newRow("mail") << u"eml"_s << false << u"E1"_s;
+        QTest::newRow("unknown extension") << u"xlsx"_s << false << u"מכתב ללקוח"_s;
     }
     void numbering() {
         QFETCH(QString, ext);

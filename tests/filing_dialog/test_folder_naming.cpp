@@ -11,6 +11,7 @@
 #include "util/state.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
@@ -48,126 +49,47 @@ class TestFolderNaming : public QObject {
         QTest::addColumn<bool>("lcn7");
         QTest::addColumn<QString>("expected");  // below DOCS; empty: DOCS itself
 
-        QTest::newRow("client") << "F"
-                                << "123"
-                                << ""
-                                << ""
-                                << ""
-                                << "23" << false << "DOC123";
-        QTest::newRow("no kind") << ""
-                                 << "123"
-                                 << ""
-                                 << ""
-                                 << ""
-                                 << "23" << false << "DOC123";
-        QTest::newRow("M and R") << "MR"
-                                 << "8"
-                                 << ""
-                                 << ""
-                                 << ""
-                                 << "23" << false << "DOC8";
-        QTest::newRow("supplier") << "S"
-                                  << "77"
-                                  << ""
-                                  << ""
-                                  << ""
-                                  << "23" << false << "SPK77";
-        QTest::newRow("bureau, placeholder") << "L"
-                                             << ""
-                                             << ""
-                                             << ""
-                                             << "12-34"
-                                             << "23" << false << "DOC00000/L/1234";
-        QTest::newRow("bureau, marker without 81005") << "L"
-                                                      << ""
-                                                      << ""
-                                                      << ""
-                                                      << "12-34"
-                                                      << "23" << true << "DOC00000/L/1234";
-        QTest::newRow("bureau, wide placeholder") << "L"
-                                                  << ""
-                                                  << ""
-                                                  << ""
-                                                  << "1-2-3"
-                                                  << "81005" << true << "DOC0000000/L/123";
-        QTest::newRow("bureau, client") << "L"
-                                        << "5"
-                                        << ""
-                                        << ""
-                                        << "7"
-                                        << "81005" << true << "DOC5/L/7";
-        QTest::newRow("general, own kind") << "T"
-                                           << "5"
-                                           << "30"
-                                           << "9"
-                                           << ""
-                                           << "23" << false << "DOC5/30/9";
-        QTest::newRow("general, kind 26") << "T"
-                                          << "5"
-                                          << "26"
-                                          << "9"
-                                          << ""
-                                          << "23" << false << "DOC5/26/9";
-        QTest::newRow("general, kind 25") << "T"
-                                          << "5"
-                                          << "25"
-                                          << "9"
-                                          << ""
-                                          << "23" << false << "";
-        QTest::newRow("general, blank kind") << "T"
-                                             << "5"
-                                             << "abc"
-                                             << "9"
-                                             << ""
-                                             << "23" << false << "";
-        QTest::newRow("tort") << "N"
-                              << "5"
-                              << ""
-                              << "9"
-                              << ""
-                              << "23" << false << "DOC5/N/9";
-        QTest::newRow("real estate") << "W"
-                                     << "5"
-                                     << ""
-                                     << "9"
-                                     << ""
-                                     << "23" << false << "DOC5/W/9";
-        QTest::newRow("labour") << "G"
-                                << "5"
-                                << ""
-                                << "9"
-                                << ""
-                                << "23" << false << "DOC5/G/9";
-        QTest::newRow("debtor") << "H"
-                                << "5"
-                                << ""
-                                << "9"
-                                << "4"
-                                << "23" << false << "DOC5/H/4";
-        QTest::newRow("A") << "A"
-                           << "5"
-                           << ""
-                           << "9"
-                           << "4"
-                           << "23" << false << "DOC5/A/4";
-        QTest::newRow("two kinds") << "FS"
-                                   << "5"
-                                   << ""
-                                   << ""
-                                   << ""
-                                   << "23" << false << "";
-        QTest::newRow("lower case") << "f"
-                                    << "5"
-                                    << ""
-                                    << ""
-                                    << ""
-                                    << "23" << false << "";
-        QTest::newRow("unknown") << "X"
-                                 << "5"
-                                 << ""
-                                 << "9"
-                                 << "4"
-                                 << "23" << false << "";
+        QTest::newRow("client") << u"F"_s << u"123"_s << u""_s << u""_s << u""_s << u"23"_s << false
+                                << u"DOC123"_s;
+        QTest::newRow("no kind") << u""_s << u"123"_s << u""_s << u""_s << u""_s << u"23"_s << false
+                                 << u"DOC123"_s;
+        QTest::newRow("M and R") << u"MR"_s << u"8"_s << u""_s << u""_s << u""_s << u"23"_s << false
+                                 << u"DOC8"_s;
+        QTest::newRow("supplier") << u"S"_s << u"77"_s << u""_s << u""_s << u""_s << u"23"_s
+                                  << false << u"SPK77"_s;
+        QTest::newRow("bureau, placeholder") << u"L"_s << u""_s << u""_s << u""_s << u"12-34"_s
+                                             << u"23"_s << false << u"DOC00000/L/1234"_s;
+        QTest::newRow("bureau, marker without 81005")
+            << u"L"_s << u""_s << u""_s << u""_s << u"12-34"_s << u"23"_s << true
+            << u"DOC00000/L/1234"_s;
+        QTest::newRow("bureau, wide placeholder") << u"L"_s << u""_s << u""_s << u""_s << u"1-2-3"_s
+                                                  << u"81005"_s << true << u"DOC0000000/L/123"_s;
+        QTest::newRow("bureau, client")
+            << u"L"_s << u"5"_s << u""_s << u""_s << u"7"_s << u"81005"_s << true << u"DOC5/L/7"_s;
+        QTest::newRow("general, own kind")
+            << u"T"_s << u"5"_s << u"30"_s << u"9"_s << u""_s << u"23"_s << false << u"DOC5/30/9"_s;
+        QTest::newRow("general, kind 26")
+            << u"T"_s << u"5"_s << u"26"_s << u"9"_s << u""_s << u"23"_s << false << u"DOC5/26/9"_s;
+        QTest::newRow("general, kind 25")
+            << u"T"_s << u"5"_s << u"25"_s << u"9"_s << u""_s << u"23"_s << false << u""_s;
+        QTest::newRow("general, blank kind")
+            << u"T"_s << u"5"_s << u"abc"_s << u"9"_s << u""_s << u"23"_s << false << u""_s;
+        QTest::newRow("tort") << u"N"_s << u"5"_s << u""_s << u"9"_s << u""_s << u"23"_s << false
+                              << u"DOC5/N/9"_s;
+        QTest::newRow("real estate")
+            << u"W"_s << u"5"_s << u""_s << u"9"_s << u""_s << u"23"_s << false << u"DOC5/W/9"_s;
+        QTest::newRow("labour") << u"G"_s << u"5"_s << u""_s << u"9"_s << u""_s << u"23"_s << false
+                                << u"DOC5/G/9"_s;
+        QTest::newRow("debtor") << u"H"_s << u"5"_s << u""_s << u"9"_s << u"4"_s << u"23"_s << false
+                                << u"DOC5/H/4"_s;
+        QTest::newRow("A") << u"A"_s << u"5"_s << u""_s << u"9"_s << u"4"_s << u"23"_s << false
+                           << u"DOC5/A/4"_s;
+        QTest::newRow("two kinds")
+            << u"FS"_s << u"5"_s << u""_s << u""_s << u""_s << u"23"_s << false << u""_s;
+        QTest::newRow("lower case")
+            << u"f"_s << u"5"_s << u""_s << u""_s << u""_s << u"23"_s << false << u""_s;
+        QTest::newRow("unknown") << u"X"_s << u"5"_s << u""_s << u"9"_s << u"4"_s << u"23"_s
+                                 << false << u""_s;
     }
     void clientCaseFolder() {
         QFETCH(QString, kind);
@@ -221,37 +143,22 @@ class TestFolderNaming : public QObject {
         QTest::addColumn<QString>("expected");  // name after the upper-cased folder
 
         const QStringList mixed{"T1.doc", "T7.pdf", "t12.docx", "Tax.doc", "E40.msg", "X3"};
-        QTest::newRow("mixed names") << mixed << "DOC"
-                                     << "T"
-                                     << "T13.DOC";
-        QTest::newRow("other letter") << mixed << "MSG"
-                                      << "E"
-                                      << "E41.MSG";
-        QTest::newRow("no extension text") << mixed << ""
-                                           << "X"
-                                           << "X4";
-        QTest::newRow("empty folder") << QStringList() << "DOC"
-                                      << "T"
-                                      << "T1.DOC";
-        QTest::newRow("halves to even") << QStringList{"T12.5.doc", "S2.5.pdf", "S1.pdf"} << "DOC"
-                                        << "T"
-                                        << "T13.DOC";
-        QTest::newRow("halves to even, up") << QStringList{"T13.5.doc"} << "DOC"
-                                            << "T"
-                                            << "T15.DOC";
-        QTest::newRow("dot first") << QStringList{"T.5"} << "DOC"
-                                   << "T"
-                                   << "T1.DOC";
+        QTest::newRow("mixed names") << mixed << u"DOC"_s << u"T"_s << u"T13.DOC"_s;
+        QTest::newRow("other letter") << mixed << u"MSG"_s << u"E"_s << u"E41.MSG"_s;
+        QTest::newRow("no extension text") << mixed << u""_s << u"X"_s << u"X4"_s;
+        QTest::newRow("empty folder") << QStringList() << u"DOC"_s << u"T"_s << u"T1.DOC"_s;
+        QTest::newRow("halves to even")
+            << QStringList{"T12.5.doc", "S2.5.pdf", "S1.pdf"} << u"DOC"_s << u"T"_s << u"T13.DOC"_s;
+        QTest::newRow("halves to even, up")
+            << QStringList{"T13.5.doc"} << u"DOC"_s << u"T"_s << u"T15.DOC"_s;
+        QTest::newRow("dot first") << QStringList{"T.5"} << u"DOC"_s << u"T"_s << u"T1.DOC"_s;
         // Plain digits are read directly; anything else as a number is read in general.
         QTest::newRow("zeros, blanks, exponent, sixteen digits")
             << QStringList{"T0099.doc", "T 150.doc", "T1e2.doc", "T1000000000000000.doc", "Ω7.doc"}
-            << "DOC"
-            << "T"
-            << "T1000000000000001.DOC";
+            << u"DOC"_s << u"T"_s << u"T1000000000000001.DOC"_s;
         QTest::newRow("zeros, blanks, exponent")
-            << QStringList{"T0099.doc", "T 150 .doc", "T1e2.doc", "ת500.doc"} << "DOC"
-            << "T"
-            << "T151.DOC";
+            << QStringList{"T0099.doc", "T 150 .doc", "T1e2.doc", "ת500.doc"} << u"DOC"_s << u"T"_s
+            << u"T151.DOC"_s;
     }
     void nextNumber() {
         QFETCH(QStringList, files);
@@ -280,22 +187,14 @@ class TestFolderNaming : public QObject {
     void numberedName_data() {
         QTest::addColumn<QString>("ext");
         QTest::addColumn<QString>("expected");
-        QTest::newRow("doc") << "doc"
-                             << "T13";
-        QTest::newRow("DOC") << "DOC"
-                             << "T13";
-        QTest::newRow("docx") << "docx"
-                              << "T13";
-        QTest::newRow("msg") << "msg"
-                             << "E1";
-        QTest::newRow("pdf") << "pdf"
-                             << "S1";
-        QTest::newRow("xlsx: the proposed name") << "xlsx"
-                                                 << "מכתב ללקוח";
-        QTest::newRow("html: the proposed name") << "html"
-                                                 << "מכתב ללקוח";
-        QTest::newRow("no extension") << ""
-                                      << "מכתב ללקוח";
+        QTest::newRow("doc") << u"doc"_s << u"T13"_s;
+        QTest::newRow("DOC") << u"DOC"_s << u"T13"_s;
+        QTest::newRow("docx") << u"docx"_s << u"T13"_s;
+        QTest::newRow("msg") << u"msg"_s << u"E1"_s;
+        QTest::newRow("pdf") << u"pdf"_s << u"S1"_s;
+        QTest::newRow("xlsx: the proposed name") << u"xlsx"_s << u"מכתב ללקוח"_s;
+        QTest::newRow("html: the proposed name") << u"html"_s << u"מכתב ללקוח"_s;
+        QTest::newRow("no extension") << u""_s << u"מכתב ללקוח"_s;
     }
     void numberedName() {
         QFETCH(QString, ext);

@@ -23,6 +23,7 @@
 #include "util/state.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
@@ -117,20 +118,20 @@ void TestFontFix::cleanup() {
 void TestFontFix::fixesControls_data() {
     QTest::addColumn<QString>("control");
     QTest::addColumn<bool>("fixed");
-    QTest::newRow("Marlett check box") << "ChkMarlett" << false;
-    QTest::newRow("exempt check box") << "CmdSearch" << false;
-    QTest::newRow("exempt control array, other case") << "chkcolor_2" << false;
-    QTest::newRow("exempt checkable button") << "CmdSearchTik" << false;
-    QTest::newRow("ordinary check box") << "CmdOK" << true;
-    QTest::newRow("exempt name on a plain button") << "CmdGet" << true;
-    QTest::newRow("label") << "Label1" << true;
-    QTest::newRow("text box") << "TxtTeur" << true;
-    QTest::newRow("combo box") << "CboStatus" << true;
-    QTest::newRow("option button") << "Option1_0" << true;
-    QTest::newRow("list") << "List1" << true;
-    QTest::newRow("frame") << "Frame1" << true;
-    QTest::newRow("grid") << "TDBGrid1" << true;
-    QTest::newRow("date box") << "TDate" << true;
+    QTest::newRow("Marlett check box") << u"ChkMarlett"_s << false;
+    QTest::newRow("exempt check box") << u"CmdSearch"_s << false;
+    QTest::newRow("exempt control array, other case") << u"chkcolor_2"_s << false;
+    QTest::newRow("exempt checkable button") << u"CmdSearchTik"_s << false;
+    QTest::newRow("ordinary check box") << u"CmdOK"_s << true;
+    QTest::newRow("exempt name on a plain button") << u"CmdGet"_s << true;
+    QTest::newRow("label") << u"Label1"_s << true;
+    QTest::newRow("text box") << u"TxtTeur"_s << true;
+    QTest::newRow("combo box") << u"CboStatus"_s << true;
+    QTest::newRow("option button") << u"Option1_0"_s << true;
+    QTest::newRow("list") << u"List1"_s << true;
+    QTest::newRow("frame") << u"Frame1"_s << true;
+    QTest::newRow("grid") << u"TDBGrid1"_s << true;
+    QTest::newRow("date box") << u"TDate"_s << true;
 }
 
 void TestFontFix::fixesControls() {
@@ -185,15 +186,15 @@ void TestFontFix::mediumFont_data() {
     QTest::addColumn<QString>("family");        // empty: nothing changes
     QTest::addColumn<double>("size");
     QTest::newRow("special pair") << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=10"}
-                                  << "Tahoma" << 10.0;
+                                  << u"Tahoma"_s << 10.0;
     QTest::newRow("special pair wins")
         << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=10.5", "MedFontName=Courier",
                        "MedFontSize=12"}
-        << "Tahoma" << 10.5;
+        << u"Tahoma"_s << 10.5;
     QTest::newRow("special size not numeric, fallback pair")
         << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=abc", "MedFontName=Courier",
                        "MedFontSize=12"}
-        << "Courier" << 12.0;
+        << u"Courier"_s << 12.0;
     QTest::newRow("special size empty, no fallback")
         << QStringList{"MedFontNameSpe=Tahoma"} << QString() << 0.0;
     QTest::newRow("fallback without size")
