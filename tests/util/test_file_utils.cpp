@@ -3,190 +3,107 @@
 
 #include "scripted_ui.h"
 #include "test_env.h"
+#include "test_files.h"
 #include "util/file_utils.h"
 
 using namespace zv;
 
-namespace {
-
-QString Read(const QString& path) {
-    QFile f(path);
-    return f.open(QIODevice::ReadOnly) ? QString::fromLatin1(f.readAll()) : QStringLiteral("?");
-}
-
-void Touch(const QString& path) {
-    QFile f(path);
-    QVERIFY(f.open(QIODevice::WriteOnly));
-    f.write("x");
-}
-
-QString WindowsStyle(QString path) {
-    return path.replace(QLatin1Char('/'), QLatin1Char('\\'));
-}
-
-const QString kNoAccess = QStringLiteral("כנראה אין הרשאות גישה למשתמש הנוכחי");
-
-}  // namespace
-
 class TestFileUtils : public QObject {
     Q_OBJECT
   private Q_SLOTS:
-    void init();
-    void cleanup();
-    void createsMissingFileWithMarkerLine();
-    void deletesReadOnlyFile();
-    void plainQueries_data();
-    void plainQueries();
-    void patternIgnoresFlags_data();
-    void patternIgnoresFlags();
-    void createInMissingFolderIsReported();
-    void folderCreatedWithParents();
-    void buildDirTree_data();
+    void createDeleteAndReport();
+    void queries_data();
+    void queries();
     void buildDirTree();
-    void networkPathFromTheShareDown();
-    void networkServerIsNeverCreated();
-
-  private:
-    std::unique_ptr<test::TestEnv> env_;
-    std::unique_ptr<test::ScopedScriptedUi> ui_;
-    QString root_;
 };
 
-void TestFileUtils::init() {
-    env_ = std::make_unique<test::TestEnv>();
-    ui_ = std::make_unique<test::ScopedScriptedUi>();
-    root_ = env_->Root();
-}
-
-void TestFileUtils::cleanup() {
-    QVERIFY2((*ui_)->Texts().isEmpty() || QTest::currentTestFailed(),
-             qPrintable((*ui_)->Texts().join(QLatin1Char('|'))));
-    ui_.reset();
-    env_.reset();
-}
-
-void TestFileUtils::createsMissingFileWithMarkerLine() {
-    const QString path = root_ + QStringLiteral("/LB81.7");
+void TestFileUtils::createDeleteAndReport() {
+    test::TestEnv env;
+    test::ScopedScriptedUi ui;
+    const QString root = env.Root();
+    const QString path = root + QStringLiteral("/LB81.7");
     QVERIFY(IsFileExist(path, false, true));
-    QCOMPARE(Read(path), QStringLiteral("1\r\n"));
+    QCOMPARE(test::ReadFile(path), QStringLiteral("1\r\n"));
     // An existing file is neither truncated nor rewritten.
-    Touch(path);
+    QVERIFY(test::WriteFile(path, "x"));
     QVERIFY(IsFileExist(path, false, true));
-    QCOMPARE(Read(path), QStringLiteral("x"));
-}
-
-void TestFileUtils::deletesReadOnlyFile() {
-    const QString path = root_ + QStringLiteral("/locked.doc");
-    Touch(path);
+    QCOMPARE(test::ReadFile(path), QStringLiteral("x"));
+    // Deleting works on a read-only file too.
     QVERIFY(QFile::setPermissions(path, QFile::ReadOwner | QFile::ReadGroup));
-    QVERIFY(!IsFileExist(WindowsStyle(path), true, false));
+    QVERIFY(!IsFileExist(QString(path).replace(QLatin1Char('/'), QLatin1Char('\\')), true, false));
     QVERIFY(!QFileInfo::exists(path));
+
+    const QString missing = root + QStringLiteral("/nowhere/m.txt");
+    QVERIFY(!IsFileExist(missing, false, true));
+    QCOMPARE(ui->Texts(), QStringList{QStringLiteral("76-IsFileExist-\r\n") + missing +
+                                      QStringLiteral("\r\nPath not found")});
+
+    QVERIFY(!IsFolderExist(root + QStringLiteral("/x/y")));
+    QVERIFY(IsFolderExist(root + QStringLiteral("/x/y"), true));
+    QVERIFY(QFileInfo(root + QStringLiteral("/x/y")).isDir());
 }
 
-void TestFileUtils::plainQueries_data() {
+// A pattern only asks: the delete and create flags are ignored for it.
+void TestFileUtils::queries_data() {
     QTest::addColumn<QString>("relative");
-    QTest::addColumn<bool>("expected");
-    QTest::newRow("existing file") << QStringLiteral("/a.doc") << true;
-    QTest::newRow("missing file") << QStringLiteral("/b.doc") << false;
-    QTest::newRow("a folder is no file") << QStringLiteral("/sub") << false;
-    QTest::newRow("backslashes") << QStringLiteral("\\sub\\c.doc") << true;
-    QTest::newRow("empty path") << QString() << false;
-}
-
-void TestFileUtils::plainQueries() {
-    QFETCH(QString, relative);
-    QFETCH(bool, expected);
-    QVERIFY(QDir(root_).mkdir(QStringLiteral("sub")));
-    Touch(root_ + QStringLiteral("/a.doc"));
-    Touch(root_ + QStringLiteral("/sub/c.doc"));
-    const QString path = relative.isEmpty() ? QString() : root_ + relative;
-    QCOMPARE(IsFileExist(path), expected);
-}
-
-void TestFileUtils::patternIgnoresFlags_data() {
-    QTest::addColumn<QString>("pattern");
     QTest::addColumn<bool>("deleteIfExist");
     QTest::addColumn<bool>("createIfMissing");
     QTest::addColumn<bool>("expected");
-    QTest::newRow("match") << QStringLiteral("*.doc") << false << false << true;
-    QTest::newRow("match, delete asked") << QStringLiteral("*.doc") << true << false << true;
-    QTest::newRow("upper-case pattern") << QStringLiteral("*.DOC") << false << false << true;
-    QTest::newRow("question mark") << QStringLiteral("lette?.doc") << false << false << true;
-    QTest::newRow("no match, create asked") << QStringLiteral("*.pdf") << false << true << false;
-    QTest::newRow("folders do not count") << QStringLiteral("s*") << false << false << false;
+    const auto row = [](const char* name, const char* path, bool del, bool create, bool found) {
+        QTest::newRow(name) << QString::fromUtf8(path) << del << create << found;
+    };
+    row("existing file", "/letter.doc", false, false, true);
+    row("missing file", "/b.doc", false, false, false);
+    row("a folder is no file", "/sub", false, false, false);
+    row("backslashes", "\\sub\\c.doc", false, false, true);
+    row("empty path", "", false, false, false);
+    row("pattern, delete asked", "\\*.doc", true, false, true);
+    row("upper-case pattern", "\\*.DOC", false, false, true);
+    row("no match, create asked", "\\*.pdf", false, true, false);
+    row("folders do not match", "\\s*", false, false, false);
 }
 
-void TestFileUtils::patternIgnoresFlags() {
-    QFETCH(QString, pattern);
+void TestFileUtils::queries() {
+    QFETCH(QString, relative);
     QFETCH(bool, deleteIfExist);
     QFETCH(bool, createIfMissing);
     QFETCH(bool, expected);
-    Touch(root_ + QStringLiteral("/letter.doc"));
-    QVERIFY(QDir(root_).mkdir(QStringLiteral("sub")));
-    QCOMPARE(IsFileExist(WindowsStyle(root_) + QLatin1Char('\\') + pattern, deleteIfExist,
-                         createIfMissing),
-             expected);
-    QVERIFY(QFileInfo::exists(root_ + QStringLiteral("/letter.doc")));
-    QCOMPARE(QDir(root_).entryList(QDir::Files).size(), 1);
-}
-
-void TestFileUtils::createInMissingFolderIsReported() {
-    const QString path = root_ + QStringLiteral("/nowhere/m.txt");
-    QVERIFY(!IsFileExist(path, false, true));
-    QCOMPARE((*ui_)->Texts(), QStringList{QStringLiteral("76-IsFileExist-\r\n") + path +
-                                          QStringLiteral("\r\nPath not found")});
-    QCOMPARE((*ui_)->Messages().front().style, int(vbOKOnly));
-    (*ui_)->Clear();
-}
-
-void TestFileUtils::folderCreatedWithParents() {
-    const QString path = root_ + QStringLiteral("/x/y/z");
-    QVERIFY(!IsFolderExist(path));
-    QVERIFY(!QFileInfo::exists(root_ + QStringLiteral("/x")));
-    QVERIFY(IsFolderExist(path, true));
-    QVERIFY(QFileInfo(path).isDir());
-    QVERIFY(!IsFolderExist(QString(), true));
-}
-
-void TestFileUtils::buildDirTree_data() {
-    QTest::addColumn<QString>("relative");
-    QTest::addColumn<QString>("expectedDir");
-    QTest::newRow("nested") << QStringLiteral("/a/b/c") << QStringLiteral("/a/b/c");
-    QTest::newRow("trailing backslash") << QStringLiteral("\\x\\y\\") << QStringLiteral("/x/y");
-    QTest::newRow("mixed separators") << QStringLiteral("/m\\n/o") << QStringLiteral("/m/n/o");
-    QTest::newRow("Hebrew names") << QStringLiteral("/לקוח/תיק 5") << QStringLiteral("/לקוח/תיק 5");
-    QTest::newRow("already there") << QString() << QString();
+    test::TestEnv env;
+    test::ScopedScriptedUi ui;
+    const QString root = env.Root();
+    QVERIFY(test::WriteFile(root + QStringLiteral("/letter.doc"), "x"));
+    QVERIFY(test::WriteFile(root + QStringLiteral("/sub/c.doc"), "x"));
+    const QString path = relative.isEmpty() ? QString() : root + relative;
+    QCOMPARE(IsFileExist(path, deleteIfExist, createIfMissing), expected);
+    QCOMPARE(QDir(root).entryList(QDir::Files), QStringList{QStringLiteral("letter.doc")});
+    QCOMPARE(ui->Texts(), QStringList());
 }
 
 void TestFileUtils::buildDirTree() {
-    QFETCH(QString, relative);
-    QFETCH(QString, expectedDir);
-    QVERIFY(BuildDirTree(root_ + relative));
-    QVERIFY(QFileInfo(root_ + expectedDir).isDir());
-    QVERIFY(BuildDirTree(root_ + relative));
-}
+    test::TestEnv env;
+    test::ScopedScriptedUi ui;
+    const QString root = env.Root();
+    for (QString relative : {QStringLiteral("/a/b/c"), QStringLiteral("\\x\\y\\"),
+                             QStringLiteral("/m\\n/o"), QStringLiteral("/לקוח/תיק 5")}) {
+        QVERIFY(BuildDirTree(root + relative));
+        QVERIFY(BuildDirTree(root + relative));
+        QVERIFY(QFileInfo(root + relative.replace(QLatin1Char('\\'), QLatin1Char('/'))).isDir());
+    }
+    QCOMPARE(ui->Texts(), QStringList());
+    // "\\host\share\n\k" names /host/share/n/k here: the temporary folder is host and share.
+    QVERIFY(BuildDirTree(QStringLiteral("\\\\") +
+                         root.mid(1).replace(QLatin1Char('/'), QLatin1Char('\\')) +
+                         QStringLiteral("\\n\\k")));
+    QVERIFY(QFileInfo(root + QStringLiteral("/n/k")).isDir());
 
-void TestFileUtils::networkPathFromTheShareDown() {
-    // "\\host\share\a\b" names /host/share/a/b here: the temporary folder plays
-    // host and share.
-    QString rest = root_.mid(1);
-    const qsizetype cut = rest.indexOf(QLatin1Char('/'));
-    QVERIFY(cut > 0);
-    const QString network = QStringLiteral("\\\\") + WindowsStyle(rest) + QStringLiteral("\\a\\b");
-    QVERIFY(BuildDirTree(network));
-    QVERIFY(QFileInfo(root_ + QStringLiteral("/a/b")).isDir());
-}
-
-void TestFileUtils::networkServerIsNeverCreated() {
-    const QString server = QStringLiteral("zv-no-server-") + QFileInfo(root_).fileName();
+    const QString server = QStringLiteral("zv-no-server-") + QFileInfo(root).fileName();
     const QString network = QStringLiteral("\\\\") + server + QStringLiteral("\\share\\a");
     QVERIFY(!BuildDirTree(network));
     QVERIFY(!QFileInfo::exists(QLatin1Char('/') + server));
     // Each level below the server is tried and reported; the server itself never is.
     const QString report = QStringLiteral("76-BuildDirTree-Path not found\r\n") + network +
-                           QStringLiteral("\r\n\r\n") + kNoAccess;
-    QCOMPARE((*ui_)->Texts(), QStringList({report, report}));
-    (*ui_)->Clear();
+                           QStringLiteral("\r\n\r\nכנראה אין הרשאות גישה למשתמש הנוכחי");
+    QCOMPARE(ui->Texts(), QStringList({report, report}));
 }
 
 QTEST_MAIN(TestFileUtils)

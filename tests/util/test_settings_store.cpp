@@ -3,6 +3,7 @@
 #include <QtTest>
 
 #include "test_env.h"
+#include "test_files.h"
 #include "util/settings_store.h"
 
 using namespace zv;
@@ -11,11 +12,8 @@ class TestSettingsStore : public QObject {
     Q_OBJECT
   private Q_SLOTS:
     void fileFollowsConfigHome();
-    void roundTrip_data();
     void roundTrip();
     void generalIsAPlainSection();
-    void handWrittenGeneralIsRead();
-    void missingKeyGivesDefault();
 };
 
 void TestSettingsStore::fileFollowsConfigHome() {
@@ -27,100 +25,38 @@ void TestSettingsStore::fileFollowsConfigHome() {
              QDir::homePath() + QStringLiteral("/.config/zorvane/kavex32.ini"));
 }
 
-void TestSettingsStore::roundTrip_data() {
-    QTest::addColumn<QString>("saveApp");
-    QTest::addColumn<QString>("saveSection");
-    QTest::addColumn<QString>("saveKey");
-    QTest::addColumn<QString>("readApp");
-    QTest::addColumn<QString>("readSection");
-    QTest::addColumn<QString>("readKey");
-    QTest::addColumn<QString>("value");
-    QTest::newRow("same names") << "Kavex32"
-                                << "General"
-                                << "MainPath"
-                                << "Kavex32"
-                                << "General"
-                                << "MainPath"
-                                << "D:\\Data";
-    QTest::newRow("application case") << "Kavex32"
-                                      << "General"
-                                      << "VolnaGlobNum"
-                                      << "KAVEX32"
-                                      << "General"
-                                      << "VolnaGlobNum"
-                                      << "23";
-    QTest::newRow("section and key case") << "Kavex32"
-                                          << "GENERAL"
-                                          << "myuser"
-                                          << "kavex32"
-                                          << "General"
-                                          << "MyUser"
-                                          << "7";
-    QTest::newRow("other section") << "Kavex32"
-                                   << "Grid"
-                                   << "Width"
-                                   << "KAVEX32"
-                                   << "grid"
-                                   << "WIDTH"
-                                   << "1200";
-    QTest::newRow("Hebrew and commas") << "Kavex32"
-                                       << "General"
-                                       << "MyUserName"
-                                       << "Kavex32"
-                                       << "General"
-                                       << "MyUserName"
-                                       << "כהן, דנה";
-}
-
+// Names are without case: saved under one spelling, read and replaced under another.
 void TestSettingsStore::roundTrip() {
-    QFETCH(QString, saveApp);
-    QFETCH(QString, saveSection);
-    QFETCH(QString, saveKey);
-    QFETCH(QString, readApp);
-    QFETCH(QString, readSection);
-    QFETCH(QString, readKey);
-    QFETCH(QString, value);
     test::TestEnv env;
-    SaveSetting(saveApp, saveSection, saveKey, value);
-    QCOMPARE(GetSetting(readApp, readSection, readKey, QStringLiteral("none")), value);
-    // Saving under another spelling replaces the value rather than adding a second key.
-    SaveSetting(readApp, readSection, readKey, QStringLiteral("second"));
-    QCOMPARE(GetSetting(saveApp, saveSection, saveKey, {}), QStringLiteral("second"));
+    const QStringList rows{QStringLiteral("Kavex32/GENERAL/myuser|kavex32/General/MyUser"),
+                           QStringLiteral("Kavex32/Grid/Width|KAVEX32/grid/WIDTH"),
+                           QStringLiteral("Kavex32/General/MyUserName|KAVEX32/general/myusername")};
+    for (const QString& row : rows) {
+        const QStringList saveAs = row.section(QLatin1Char('|'), 0, 0).split(QLatin1Char('/'));
+        const QStringList readAs = row.section(QLatin1Char('|'), 1).split(QLatin1Char('/'));
+        const QString value = QStringLiteral("כהן, דנה ") + row;
+        QCOMPARE(GetSetting(readAs[0], readAs[1], readAs[2], QStringLiteral("none")),
+                 QStringLiteral("none"));
+        SaveSetting(saveAs[0], saveAs[1], saveAs[2], value);
+        QCOMPARE(GetSetting(readAs[0], readAs[1], readAs[2], {}), value);
+        SaveSetting(readAs[0], readAs[1], readAs[2], QStringLiteral("second"));
+        QCOMPARE(GetSetting(saveAs[0], saveAs[1], saveAs[2], {}), QStringLiteral("second"));
+    }
 }
 
 void TestSettingsStore::generalIsAPlainSection() {
     test::TestEnv env;
-    SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), QStringLiteral("MainPath"),
-                QStringLiteral("/srv/zorvane"));
-    SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), QStringLiteral("MyUserName"),
-                QStringLiteral("דנה"));
-    QFile f(SettingsStoreFile(QStringLiteral("Kavex32")));
-    QVERIFY(f.open(QIODevice::ReadOnly));
-    const QString text = QString::fromUtf8(f.readAll());
-    QVERIFY2(text.startsWith(QStringLiteral("[General]\n")), qPrintable(text));
-    QVERIFY(text.contains(QStringLiteral("MainPath=/srv/zorvane\n")));
-    QVERIFY(!text.contains(QStringLiteral("%General")));
-}
-
-void TestSettingsStore::handWrittenGeneralIsRead() {
-    test::TestEnv env;
     const QString file = SettingsStoreFile(QStringLiteral("Kavex32"));
-    QVERIFY(QDir().mkpath(QFileInfo(file).path()));
-    QFile f(file);
-    QVERIFY(f.open(QIODevice::WriteOnly));
-    f.write("[General]\nMainPath=/srv/z\nVolnaGlobNum=23\n");
-    f.close();
+    QVERIFY(test::WriteFile(file, "[General]\nMainPath=/srv/z\nVolnaGlobNum=23\n"));
     QCOMPARE(GetSetting(QStringLiteral("KAVEX32"), QStringLiteral("General"),
                         QStringLiteral("VolnaGlobNum"), {}),
              QStringLiteral("23"));
-}
-
-void TestSettingsStore::missingKeyGivesDefault() {
-    test::TestEnv env;
-    QCOMPARE(GetSetting(QStringLiteral("Kavex32"), QStringLiteral("General"),
-                        QStringLiteral("MainPath"), QStringLiteral("dflt")),
-             QStringLiteral("dflt"));
-    QVERIFY(!QFileInfo::exists(SettingsStoreFile(QStringLiteral("Kavex32"))));
+    SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), QStringLiteral("MyUserName"),
+                QStringLiteral("דנה"));
+    const QString text = QString::fromUtf8(test::ReadFile(file).toLatin1());
+    QVERIFY2(text.startsWith(QStringLiteral("[General]\n")), qPrintable(text));
+    QVERIFY(text.contains(QStringLiteral("MainPath=/srv/z\n")));
+    QVERIFY(!text.contains(QStringLiteral("%General")));
 }
 
 QTEST_MAIN(TestSettingsStore)
