@@ -3,10 +3,10 @@
 // data folder with the suite's executable, and a document to file.
 
 #include <QDir>
-#include <QFile>
 #include <QString>
 
 #include "test_env.h"
+#include "test_files.h"
 
 namespace zv::test {
 
@@ -14,12 +14,6 @@ struct Installation {
     QString mainPath;
     QString document;
 };
-
-inline bool WriteBytes(const QString& path, const QByteArray& content) {
-    QDir().mkpath(path.left(path.lastIndexOf(QLatin1Char('/'))));
-    QFile f(path);
-    return f.open(QIODevice::WriteOnly) && f.write(content) == content.size();
-}
 
 // withExe false leaves out Zorvane.Exe; an empty volna leaves out VolnaGlobNum.
 inline Installation MakeInstallation(const TestEnv& env, bool withExe = true,
@@ -29,12 +23,12 @@ inline Installation MakeInstallation(const TestEnv& env, bool withExe = true,
     if (!volna.isEmpty()) {
         ini += "VolnaGlobNum=" + volna + "\r\n";
     }
-    WriteBytes(env.LocalAppData() + QStringLiteral("/Zorvane/Kavex32R.txt"), ini);
+    WriteFile(env.LocalAppData() + QStringLiteral("/Zorvane/Kavex32R.txt"), ini);
     QDir().mkpath(inst.mainPath);
     if (withExe) {
-        WriteBytes(inst.mainPath + QStringLiteral("/Zorvane.Exe"), "MZ");
+        WriteFile(inst.mainPath + QStringLiteral("/Zorvane.Exe"), "MZ");
     }
-    WriteBytes(inst.document, "document");
+    WriteFile(inst.document, "document");
     return inst;
 }
 

@@ -2,7 +2,6 @@
 // on a sample installation.
 
 #include <QDir>
-#include <QFile>
 #include <QSqlDatabase>
 #include <QSqlQuery>
 #include <QTest>
@@ -12,12 +11,15 @@
 #include "scripted_ui.h"
 #include "startup/backend_selection.h"
 #include "test_env.h"
+#include "test_files.h"
 #include "util/state.h"
 
 using namespace zv;
 
 namespace {
 
+// The installation's client number; quoted in the query that looks up its MSql row.
+const QString kOwn = QStringLiteral("2'3");
 const QString kComplete = QStringLiteral(
     "[MSSQL]\nProvider=SQLOLEDB\nDataSource=srv\\office\n[1]\nUserID=dana\nPassWord=p;w\n");
 
@@ -55,12 +57,11 @@ class Installation {
         CreateSampleInstallation(env_.DataDir(), options);
         SetMainPath(env_.DataDir());
         SetMyUser(QStringLiteral("1"));
-        SetVolnaGlobNum(QStringLiteral("23"));
+        SetVolnaGlobNum(kOwn);
     }
     QString Path(const QString& relative) const { return QDir(env_.DataDir()).filePath(relative); }
     bool WriteIni(const QString& text) const {
-        QFile f(Path(QStringLiteral("Def/MSSQLSetting.INI")));
-        return f.open(QIODevice::WriteOnly) && f.write(text.toUtf8()) >= 0;
+        return test::WriteFile(Path(QStringLiteral("Def/MSSQLSetting.INI")), text.toUtf8());
     }
     // The MSql row of a client number with the four flags (IsDocs, IsBM, IsOffice, IsZorva).
     bool SetRow(const QString& client, const QVariantList& flags) const {
@@ -87,125 +88,60 @@ class TestBackendSelection : public QObject {
     Q_OBJECT
 
   private slots:
-    void login_data();
-    void login();
-    void flagsFromRow_data();
-    void flagsFromRow();
+    void selection_data();
+    void selection();
     void flagStaysSet();
     void mainUnreadable_data();
     void mainUnreadable();
 };
 
-void TestBackendSelection::login_data() {
+// Expected: provider|data source|user|password|flags, the flags as D, B, O, Z or -; the MSql
+// row holds IsDocs, IsBM, IsOffice, IsZorva.
+void TestBackendSelection::selection_data() {
     QTest::addColumn<QString>("ini");  // null: no file
-    QTest::addColumn<QString>("provider");
-    QTest::addColumn<QString>("dataSource");
-    QTest::addColumn<QString>("user");
-    QTest::addColumn<QString>("password");
-    QTest::addColumn<QString>("flags");
-
-    QTest::newRow("complete, own login") << kComplete << "SQLOLEDB"
-                                         << "srv\\office"
-                                         << "dana"
-                                         << "p;w"
-                                         << "DBOZ";
-    QTest::newRow("own login without password")
-        << "[MSSQL]\nProvider=P\nDataSource=S\n[1]\nUserID=dana\n[000]\nUserID=x\nPassWord=y\n"
-        << "P"
-        << "S"
-        << "dana"
-        << ""
-        << "DBOZ";
-    QTest::newRow("shared login 000, own password ignored")
-        << "[MSSQL]\nProvider=P\nDataSource=S\n[1]\nPassWord=own\n[000]\nUserID=office\n"
-           "PassWord=shared\n"
-        << "P"
-        << "S"
-        << "office"
-        << "shared"
-        << "DBOZ";
-    QTest::newRow("no provider") << "[MSSQL]\nDataSource=S\n[1]\nUserID=dana\nPassWord=p\n"
-                                 << ""
-                                 << "S"
-                                 << "dana"
-                                 << "p"
-                                 << "----";
-    QTest::newRow("no data source") << "[MSSQL]\nProvider=P\n[1]\nUserID=dana\n"
-                                    << "P"
-                                    << ""
-                                    << "dana"
-                                    << ""
-                                    << "----";
-    QTest::newRow("no login in either section")
-        << "[MSSQL]\nProvider=P\nDataSource=S\n[2]\nUserID=other\n[000]\nPassWord=y\n"
-        << "P"
-        << "S"
-        << ""
-        << "y"
-        << "----";
-    QTest::newRow("no settings file") << QString() << ""
-                                      << ""
-                                      << ""
-                                      << ""
-                                      << "----";
-}
-
-void TestBackendSelection::login() {
-    QFETCH(QString, ini);
-    QFETCH(QString, provider);
-    QFETCH(QString, dataSource);
-    QFETCH(QString, user);
-    QFETCH(QString, password);
-    QFETCH(QString, flags);
-    Installation inst;
-    test::ScopedScriptedUi ui;
-    QVERIFY(inst.SetRow(QStringLiteral("23"), {1, 1, 1, 1}));
-    if (!ini.isNull())
-        QVERIFY(inst.WriteIni(ini));
-
-    GetMSSQLParam();
-    QCOMPARE(Provider(), provider);
-    QCOMPARE(DataSource(), dataSource);
-    QCOMPARE(UserID(), user);
-    QCOMPARE(PassWord(), password);
-    QCOMPARE(Flags(), flags);
-    QCOMPARE(ui->Texts(), QStringList());
-}
-
-void TestBackendSelection::flagsFromRow_data() {
-    QTest::addColumn<QString>("clientNumber");
     QTest::addColumn<QString>("rowOf");
     QTest::addColumn<QVariantList>("row");
-    QTest::addColumn<QString>("flags");
+    QTest::addColumn<QString>("expected");
+    const auto row = [](const char* name, const QString& ini, const QVariantList& flags,
+                        const char* expected, const QString& rowOf = kOwn) {
+        QTest::newRow(name) << ini << rowOf << flags << QString::fromUtf8(expected);
+    };
+    const QVariantList all{1, 1, 1, 1};
+    row("complete, own login", kComplete, all, "SQLOLEDB|srv\\office|dana|p;w|DBOZ");
+    row("shared login 000, own password ignored",
+        "[MSSQL]\nProvider=P\nDataSource=S\n[1]\nPassWord=own\n[000]\nUserID=office\n"
+        "PassWord=shared\n",
+        all, "P|S|office|shared|DBOZ");
+    row("no provider", "[MSSQL]\nDataSource=S\n[1]\nUserID=dana\nPassWord=p\n", all,
+        "|S|dana|p|----");
+    row("no login in either section",
+        "[MSSQL]\nProvider=P\nDataSource=S\n[2]\nUserID=other\n[000]\nPassWord=y\n", all,
+        "P|S||y|----");
+    row("no settings file", QString(), all, "||||----");
     const QVariant null{QMetaType(QMetaType::Int)};
-    QTest::newRow("clients on the server only") << "23"
-                                                << "23" << QVariantList{0, 0, 1, 0} << "--O-";
-    QTest::newRow("documents and reminders") << "23"
-                                             << "23" << QVariantList{1, 1, 0, 0} << "DB--";
-    QTest::newRow("true written as -1") << "23"
-                                        << "23" << QVariantList{-1, 0, 0, -1} << "D--Z";
-    QTest::newRow("null reads as false") << "23"
-                                         << "23" << QVariantList{null, 1, null, null} << "-B--";
-    QTest::newRow("no row for this installation") << "42"
-                                                  << "23" << QVariantList{1, 1, 1, 1} << "----";
-    QTest::newRow("client number with an apostrophe")
-        << "2'3"
-        << "2'3" << QVariantList{0, 0, 1, 1} << "--OZ";
+    row("clients on the server only", kComplete, {0, 0, 1, 0},
+        "SQLOLEDB|srv\\office|dana|p;w|--O-");
+    row("true written as -1", kComplete, {-1, 0, 0, -1}, "SQLOLEDB|srv\\office|dana|p;w|D--Z");
+    row("null reads as false", kComplete, {null, 1, null, null},
+        "SQLOLEDB|srv\\office|dana|p;w|-B--");
+    row("no row for this installation", kComplete, all, "SQLOLEDB|srv\\office|dana|p;w|----",
+        QStringLiteral("23"));
 }
 
-void TestBackendSelection::flagsFromRow() {
-    QFETCH(QString, clientNumber);
+void TestBackendSelection::selection() {
+    QFETCH(QString, ini);
     QFETCH(QString, rowOf);
     QFETCH(QVariantList, row);
-    QFETCH(QString, flags);
+    QFETCH(QString, expected);
     Installation inst;
     test::ScopedScriptedUi ui;
-    QVERIFY(inst.WriteIni(kComplete));
     QVERIFY(inst.SetRow(rowOf, row));
-    SetVolnaGlobNum(clientNumber);
-
+    if (!ini.isNull())
+        QVERIFY(inst.WriteIni(ini));
     GetMSSQLParam();
-    QCOMPARE(Flags(), flags);
+    QCOMPARE(QStringList({Provider(), DataSource(), UserID(), PassWord(), Flags()})
+                 .join(QLatin1Char('|')),
+             expected);
     QCOMPARE(ui->Texts(), QStringList());
 }
 
@@ -214,10 +150,10 @@ void TestBackendSelection::flagStaysSet() {
     Installation inst;
     test::ScopedScriptedUi ui;
     QVERIFY(inst.WriteIni(kComplete));
-    QVERIFY(inst.SetRow(QStringLiteral("23"), {0, 1, 1, 0}));
+    QVERIFY(inst.SetRow(kOwn, {0, 1, 1, 0}));
     GetMSSQLParam();
     QCOMPARE(Flags(), QStringLiteral("-BO-"));
-    QVERIFY(inst.SetRow(QStringLiteral("23"), {1, 0, 0, 0}));
+    QVERIFY(inst.SetRow(kOwn, {1, 0, 0, 0}));
     GetMSSQLParam();
     QCOMPARE(Flags(), QStringLiteral("DBO-"));
 }
@@ -225,14 +161,14 @@ void TestBackendSelection::flagStaysSet() {
 void TestBackendSelection::mainUnreadable_data() {
     QTest::addColumn<QString>("damage");
     QTest::addColumn<QString>("start");
-    QTest::newRow("missing") << "missing"
-                             << "3024-0-GetMSSQLParam-";
-    QTest::newRow("locked by another writer") << "locked"
-                                              << "3260-0-GetMSSQLParam-";
-    QTest::newRow("without the MSql table") << "no table"
-                                            << "-0-GetMSSQLParam-";
-    QTest::newRow("row without a flag column") << "no column"
-                                               << "3265-0-GetMSSQLParam-";
+    QTest::newRow("missing") << QStringLiteral("missing")
+                             << QStringLiteral("3024-0-GetMSSQLParam-");
+    QTest::newRow("locked by another writer")
+        << QStringLiteral("locked") << QStringLiteral("3260-0-GetMSSQLParam-");
+    QTest::newRow("without the MSql table")
+        << QStringLiteral("no table") << QStringLiteral("-0-GetMSSQLParam-");
+    QTest::newRow("row without a flag column")
+        << QStringLiteral("no column") << QStringLiteral("3265-0-GetMSSQLParam-");
 }
 
 void TestBackendSelection::mainUnreadable() {
@@ -241,7 +177,7 @@ void TestBackendSelection::mainUnreadable() {
     Installation inst;
     test::ScopedScriptedUi ui;
     QVERIFY(inst.WriteIni(kComplete));
-    QVERIFY(inst.SetRow(QStringLiteral("23"), {1, 1, 1, 1}));
+    QVERIFY(inst.SetRow(kOwn, {1, 1, 1, 1}));
     const QString mainMdb = inst.Path(QStringLiteral("MAIN.MDB"));
     std::unique_ptr<File> lock;
     if (damage == QLatin1String("missing")) {
@@ -252,12 +188,7 @@ void TestBackendSelection::mainUnreadable() {
     } else if (damage == QLatin1String("no table")) {
         QVERIFY(File(mainMdb).Exec(QStringLiteral("DROP TABLE MSql")));
     } else {
-        File main(mainMdb);
-        QVERIFY(
-            main.Exec(QStringLiteral("CREATE TABLE M2 (ClientID TEXT, IsDocs, IsBM, IsOffice)")));
-        QVERIFY(main.Exec(QStringLiteral("INSERT INTO M2 VALUES ('23', 1, 1, 1)")));
-        QVERIFY(main.Exec(QStringLiteral("DROP TABLE MSql")));
-        QVERIFY(main.Exec(QStringLiteral("ALTER TABLE M2 RENAME TO MSql")));
+        QVERIFY(File(mainMdb).Exec(QStringLiteral("ALTER TABLE MSql DROP COLUMN IsZorva")));
     }
 
     GetMSSQLParam();

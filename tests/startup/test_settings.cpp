@@ -5,19 +5,13 @@
 #include "scripted_ui.h"
 #include "startup/settings.h"
 #include "test_env.h"
+#include "test_files.h"
 #include "util/settings_store.h"
 #include "util/state.h"
 
 using namespace zv;
 
 namespace {
-
-void WriteFile(const QString& path, const QByteArray& content) {
-    QVERIFY(QDir().mkpath(QFileInfo(path).path()));
-    QFile f(path);
-    QVERIFY(f.open(QIODevice::WriteOnly));
-    f.write(content);
-}
 
 QStringList Tree(const QString& root) {
     QStringList out;
@@ -42,16 +36,11 @@ class TestSettings : public QObject {
     void cleanup();
     void readOrder_data();
     void readOrder();
-    void fileUnderExistingLocalAppData();
-    void localAppDataNotYetThere();
-    void xdgDataHomeWithoutLocalAppData();
-    void fallbackInsideInstallation();
+    void location_data();
+    void location();
     void noFallbackBeforeMainPath();
-    void pathIsCached();
-    void basicParamsAndWorkFolders();
-    void workFoldersIdempotent();
+    void basicParamsAndIdempotentWorkFolders();
     void missingMainPathFolderIsReported();
-    void noWorkFolderWithoutMainPath();
 
   private:
     std::unique_ptr<test::TestEnv> env_;
@@ -61,7 +50,7 @@ class TestSettings : public QObject {
     }
     // A path inside a regular file: no folder can ever be made there.
     QString Unusable() const {
-        WriteFile(env_->Root() + QStringLiteral("/plainfile"), "x");
+        test::WriteFile(env_->Root() + QStringLiteral("/plainfile"), "x");
         return env_->Root() + QStringLiteral("/plainfile/sub");
     }
 };
@@ -81,16 +70,16 @@ void TestSettings::readOrder_data() {
     QTest::addColumn<QString>("file");
     QTest::addColumn<bool>("development");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("store wins") << "store"
-                                << "file" << false << "store";
-    QTest::newRow("file when store lacks it") << ""
-                                              << "file" << false << "file";
-    QTest::newRow("neither") << ""
-                             << "" << false << "";
-    QTest::newRow("development: file alone") << "store"
-                                             << "file" << true << "file";
-    QTest::newRow("development: store only reads empty") << "store"
-                                                         << "" << true << "";
+    const auto row = [](const char* name, const char* store, const char* file, bool development,
+                        const char* expected) {
+        QTest::newRow(name) << QString::fromLatin1(store) << QString::fromLatin1(file)
+                            << development << QString::fromLatin1(expected);
+    };
+    row("store wins", "store", "file", false, "store");
+    row("file when store lacks it", "", "file", false, "file");
+    row("neither", "", "", false, "");
+    row("development: file alone", "store", "file", true, "file");
+    row("development: store only reads empty", "store", "", true, "");
 }
 
 void TestSettings::readOrder() {
@@ -102,46 +91,44 @@ void TestSettings::readOrder() {
         SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), QStringLiteral("LNUM"),
                     store);
     }
-    WriteFile(GlobalFile(), "[General]\r\nLNUM=" + file.toUtf8() + "\r\n");
+    QVERIFY(test::WriteFile(GlobalFile(), "[General]\r\nLNUM=" + file.toUtf8() + "\r\n"));
     SetIsDevelopmentRun(development);
     QCOMPARE(ReadSetting(QStringLiteral("KAVEX32"), QStringLiteral("General"),
                          QStringLiteral("LNUM"), {}),
              expected);
 }
 
-void TestSettings::fileUnderExistingLocalAppData() {
-    QCOMPARE(GetGlobalKeysFile(), GlobalFile());
-    QVERIFY(QFileInfo(env_->LocalAppData() + QStringLiteral("/Zorvane")).isDir());
-    WriteFile(GlobalFile(), "[General]\nMyUser=12\n");
-    QCOMPARE(ReadGlobalKeys(QStringLiteral("General"), QStringLiteral("MyUser")),
-             QStringLiteral("12"));
+// "%R" stands for the test's folder, "%L" for its LOCALAPPDATA; "-" unsets LOCALAPPDATA and
+// points XDG_DATA_HOME at "%R".
+void TestSettings::location_data() {
+    QTest::addColumn<QString>("localAppData");
+    QTest::addColumn<QString>("expected");
+    const auto row = [](const char* name, const char* localAppData, const char* expected) {
+        QTest::newRow(name) << QString::fromLatin1(localAppData) << QString::fromLatin1(expected);
+    };
+    row("LOCALAPPDATA present", "%L", "%L/Zorvane/Kavex32R.txt");
+    row("LOCALAPPDATA not yet there", "%R/new/local", "%R/new/local/Kavex32R.txt");
+    row("LOCALAPPDATA absent", "-", "%R/Zorvane/Kavex32R.txt");
 }
 
-void TestSettings::localAppDataNotYetThere() {
-    const QString fresh = env_->Root() + QStringLiteral("/new/local");
-    qputenv("LOCALAPPDATA", fresh.toUtf8());
-    QCOMPARE(GetGlobalKeysFile(), fresh + QStringLiteral("/Kavex32R.txt"));
-    QVERIFY(QFileInfo(fresh).isDir());
-    QVERIFY(!QFileInfo::exists(fresh + QStringLiteral("/Zorvane")));
-}
-
-void TestSettings::xdgDataHomeWithoutLocalAppData() {
-    qunsetenv("LOCALAPPDATA");
-    const QByteArray old = qgetenv("XDG_DATA_HOME");
-    qputenv("XDG_DATA_HOME", env_->Root().toUtf8());
+void TestSettings::location() {
+    QFETCH(QString, localAppData);
+    QFETCH(QString, expected);
+    for (QString* s : {&localAppData, &expected}) {
+        s->replace(QStringLiteral("%R"), env_->Root())
+            .replace(QStringLiteral("%L"), env_->LocalAppData());
+    }
+    const QByteArray oldDataHome = qgetenv("XDG_DATA_HOME");
+    if (localAppData == QLatin1String("-")) {
+        qunsetenv("LOCALAPPDATA");
+        qputenv("XDG_DATA_HOME", env_->Root().toUtf8());
+    } else {
+        qputenv("LOCALAPPDATA", localAppData.toUtf8());
+    }
     const QString file = GetGlobalKeysFile();
-    qputenv("XDG_DATA_HOME", old);
-    QCOMPARE(file, env_->Root() + QStringLiteral("/Zorvane/Kavex32R.txt"));
-}
-
-void TestSettings::fallbackInsideInstallation() {
-    qputenv("LOCALAPPDATA", Unusable().toUtf8());
-    SetMainPath(env_->DataDir());
-    QVERIFY(QDir().mkpath(env_->DataDir()));
-    QCOMPARE(GetGlobalKeysFile(), env_->DataDir() + QStringLiteral("/Def/UMR/Kavex32R.txt"));
-    QVERIFY(QFileInfo(env_->DataDir() + QStringLiteral("/Def/UMR")).isDir());
-    // The failed attempts at the unusable folder were reported.
-    QVERIFY(!(*ui_)->Texts().isEmpty());
+    qputenv("XDG_DATA_HOME", oldDataHome);
+    QCOMPARE(file, expected);
+    QVERIFY(QFileInfo(file).dir().exists());
 }
 
 void TestSettings::noFallbackBeforeMainPath() {
@@ -151,63 +138,47 @@ void TestSettings::noFallbackBeforeMainPath() {
     QCOMPARE(GlobalKeysFileCache(), QString());
     QCOMPARE(QFileInfo::exists(QStringLiteral("/Def/UMR")), atRootBefore);
     QCOMPARE(ReadGlobalKeys(QStringLiteral("General"), QStringLiteral("MainPath")), QString());
-    // Once MainPath is known the fallback folder is used.
+    // Once MainPath is known the fallback folder is made and used; the failed attempts at the
+    // unusable folder were reported.
     SetMainPath(env_->DataDir());
     QVERIFY(QDir().mkpath(env_->DataDir()));
-    WriteFile(env_->DataDir() + QStringLiteral("/Def/UMR/Kavex32R.txt"), "[General]\nMyUser=3\n");
+    QCOMPARE(GetGlobalKeysFile(), env_->DataDir() + QStringLiteral("/Def/UMR/Kavex32R.txt"));
+    QVERIFY(!(*ui_)->Texts().isEmpty());
+    QVERIFY(test::WriteFile(GetGlobalKeysFile(), "[General]\nMyUser=3\n"));
     QCOMPARE(ReadGlobalKeys(QStringLiteral("General"), QStringLiteral("MyUser")),
              QStringLiteral("3"));
 }
 
-void TestSettings::pathIsCached() {
-    const QString first = GetGlobalKeysFile();
-    qputenv("LOCALAPPDATA", (env_->Root() + QStringLiteral("/elsewhere")).toUtf8());
-    QCOMPARE(GetGlobalKeysFile(), first);
-    QVERIFY(!QFileInfo::exists(env_->Root() + QStringLiteral("/elsewhere")));
-}
-
-void TestSettings::basicParamsAndWorkFolders() {
+void TestSettings::basicParamsAndIdempotentWorkFolders() {
     QVERIFY(QDir().mkpath(env_->DataDir()));
     SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), QStringLiteral("MainPath"),
                 env_->DataDir());
     SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), QStringLiteral("MyUser"),
                 QStringLiteral("7"));
-    WriteFile(GlobalFile(), "[General]\nMyUserName=\"דנה כהן\"\nVolnaGlobNum=23\nMyUser=9\n");
+    QVERIFY(test::WriteFile(GlobalFile(),
+                            "[General]\nMyUserName=\"דנה כהן\"\nVolnaGlobNum=23\nMyUser=9\n"));
     SetBasicParam();
     QCOMPARE(MainPath(), env_->DataDir());
     QCOMPARE(MyUser(), QStringLiteral("7"));
     QCOMPARE(MyUserName(), QStringLiteral("דנה כהן"));
     QCOMPARE(VolnaGlobNum(), QStringLiteral("23"));
-    QCOMPARE(GetWorkDir(), env_->DataDir() + QStringLiteral("/Dat1/"));
     QCOMPARE(Tree(env_->DataDir()), kWorkFolders);
     QCOMPARE((*ui_)->Texts(), QStringList());
-}
-
-void TestSettings::workFoldersIdempotent() {
-    QVERIFY(QDir().mkpath(env_->DataDir() + QStringLiteral("/Dat1/Temp")));
-    WriteFile(env_->DataDir() + QStringLiteral("/Dat1/Temp/keep.txt"), "keep");
-    PrepareWorkDir(env_->DataDir() + QStringLiteral("/Dat1"));
-    QCOMPARE(GetWorkDir(), env_->DataDir() + QStringLiteral("/Dat1/"));
-    const QStringList once = Tree(env_->DataDir());
+    // Preparing again keeps what the folders hold.
+    QVERIFY(test::WriteFile(env_->DataDir() + QStringLiteral("/Dat1/Temp/keep.txt"), "keep"));
     PrepareWorkDir(env_->DataDir() + QStringLiteral("/Dat1/"));
-    QCOMPARE(Tree(env_->DataDir()), once);
-    QCOMPARE(once, kWorkFolders + QStringList{QStringLiteral("/Dat1/Temp/keep.txt")});
+    QCOMPARE(GetWorkDir(), env_->DataDir() + QStringLiteral("/Dat1/"));
+    QCOMPARE(Tree(env_->DataDir()),
+             kWorkFolders + QStringList{QStringLiteral("/Dat1/Temp/keep.txt")});
 }
 
 void TestSettings::missingMainPathFolderIsReported() {
-    WriteFile(GlobalFile(),
-              "[General]\nMainPath=" + env_->DataDir().toUtf8() + "\nVolnaGlobNum=23\nMyUser=4\n");
+    QVERIFY(test::WriteFile(GlobalFile(), "[General]\nMainPath=" + env_->DataDir().toUtf8() +
+                                              "\nVolnaGlobNum=23\nMyUser=4\n"));
     SetBasicParam();
     QCOMPARE((*ui_)->Texts(), QStringList{QStringLiteral("76-0--SetBasicParam-Path not found")});
     QCOMPARE(VolnaGlobNum(), QStringLiteral("23"));
     QVERIFY(!QFileInfo::exists(env_->DataDir()));
-}
-
-void TestSettings::noWorkFolderWithoutMainPath() {
-    SetBasicParam();
-    QCOMPARE(MainPath(), QString());
-    QCOMPARE(GetWorkDir(), QString());
-    QCOMPARE((*ui_)->Texts(), QStringList());
 }
 
 QTEST_MAIN(TestSettings)
