@@ -20,117 +20,65 @@ class TestConnectionString : public QObject {
     void odbcDriverFromEnvironment();
     void parsePostgres_data();
     void parsePostgres();
-    void roundTripOfQuotedValues_data();
-    void roundTripOfQuotedValues();
     void unknownProvider();
     void adapter_data();
     void adapter();
 };
 
+// After "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;" and the fixed pairs.
 void TestConnectionString::build_data() {
-    QTest::addColumn<QString>("provider");
-    QTest::addColumn<QString>("dataSource");
     QTest::addColumn<QString>("user");
     QTest::addColumn<QString>("password");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("with password")
-        << "SQLOLEDB"
-        << "srv\\SQL2019"
-        << "sa"
-        << "secret"
-        << "Provider=SQLOLEDB;Data Source=srv\\SQL2019;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=sa;Password=secret;";
-    QTest::newRow("empty password: no Password pair")
-        << "SQLNCLI11"
-        << "srv"
-        << "sa"
-        << ""
-        << "Provider=SQLNCLI11;Data Source=srv;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;User ID=sa;";
-    QTest::newRow("password with ; is quoted")
-        << "SQLOLEDB"
-        << "srv"
-        << "sa"
-        << "a;b"
-        << "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=sa;Password=\"a;b\";";
-    QTest::newRow("leading blank is quoted")
-        << "SQLOLEDB"
-        << "srv"
-        << " sa"
-        << "x"
-        << "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=\" sa\";Password=x;";
-    QTest::newRow("leading double quote in single quotes")
-        << "SQLOLEDB"
-        << "srv"
-        << "sa"
-        << "\"pw"
-        << "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=sa;Password='\"pw';";
-    QTest::newRow("both quotes: doubled double quotes")
-        << "SQLOLEDB"
-        << "srv"
-        << "sa"
-        << "'a\";"
-        << "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=sa;Password=\"'a\"\";\";";
-    QTest::newRow("other specials stay as stored")
-        << "SQLOLEDB"
-        << "srv"
-        << "sa"
-        << "p=w'x\"y"
-        << "Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
-           "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;"
-           "User ID=sa;Password=p=w'x\"y;";
+    const auto row = [](const char* name, const char* user, const char* password,
+                        const char* expected) {
+        QTest::newRow(name) << QString::fromLatin1(user) << QString::fromLatin1(password)
+                            << QString::fromLatin1(expected);
+    };
+    row("with password", "sa", "secret", "User ID=sa;Password=secret;");
+    row("empty password: no Password pair", "sa", "", "User ID=sa;");
+    row("password with ; is quoted", "sa", "a;b", "User ID=sa;Password=\"a;b\";");
+    row("leading blank is quoted", " sa", "x", "User ID=\" sa\";Password=x;");
+    row("leading double quote in single quotes", "sa", "\"pw", "User ID=sa;Password='\"pw';");
+    row("both quotes: doubled double quotes", "sa", "'a\";", "User ID=sa;Password=\"'a\"\";\";");
+    row("other specials stay as stored", "sa", "p=w'x\"y", "User ID=sa;Password=p=w'x\"y;");
 }
 
 void TestConnectionString::build() {
-    QFETCH(QString, provider);
-    QFETCH(QString, dataSource);
     QFETCH(QString, user);
     QFETCH(QString, password);
     QFETCH(QString, expected);
     test::TestEnv env;
-    SetProvider(provider);
-    SetDataSource(dataSource);
+    SetProvider(QStringLiteral("SQLOLEDB"));
+    SetDataSource(QStringLiteral("srv"));
     SetUserID(user);
     SetPassWord(password);
     SetVolnaGlobNum(QStringLiteral("23"));
-    QCOMPARE(GetConnectionByDbName(QStringLiteral("MDOCS")), expected);
+    QCOMPARE(GetConnectionByDbName(QStringLiteral("MDOCS")),
+             QStringLiteral("Provider=SQLOLEDB;Data Source=srv;Initial Catalog=MDOCS23;"
+                            "MARS Connection=True;Connect Timeout=30;DataTypeCompatibility=80;") +
+                 expected);
 }
 
+// Each provider of SQL Server maps onto ODBC the same way; the password survives quoting.
 void TestConnectionString::parseSqlServer_data() {
     QTest::addColumn<QString>("provider");
     QTest::addColumn<QString>("dataSource");
-    QTest::addColumn<QString>("odbc");
-    QTest::newRow("SQLOLEDB host") << "SQLOLEDB"
-                                   << "db1"
-                                   << "DRIVER={FreeTDS};SERVER=db1;DATABASE=OFFICE7;UID=sa;"
-                                      "PWD={a;b};";
-    QTest::newRow("SQLNCLI11 host,port")
-        << "SQLNCLI11"
-        << "db1,1444"
-        << "DRIVER={FreeTDS};SERVER=db1;PORT=1444;DATABASE=OFFICE7;UID=sa;PWD={a;b};";
-    QTest::newRow("MSOLEDBSQL19 named instance")
-        << "MSOLEDBSQL19"
-        << "db1\\SQLEXPRESS"
-        << "DRIVER={FreeTDS};SERVER=db1\\SQLEXPRESS;DATABASE=OFFICE7;UID=sa;PWD={a;b};";
-    QTest::newRow("SQLOLEDB.1") << "SQLOLEDB.1"
-                                << "db1"
-                                << "DRIVER={FreeTDS};SERVER=db1;DATABASE=OFFICE7;UID=sa;"
-                                   "PWD={a;b};";
+    QTest::addColumn<QString>("server");
+    const auto row = [](const char* provider, const char* dataSource, const char* server) {
+        QTest::newRow(provider) << QString::fromLatin1(provider) << QString::fromLatin1(dataSource)
+                                << QString::fromLatin1(server);
+    };
+    row("SQLOLEDB", "db1", "SERVER=db1");
+    row("SQLNCLI11", "db1,1444", "SERVER=db1;PORT=1444");
+    row("MSOLEDBSQL19", "db1\\SQLEXPRESS", "SERVER=db1\\SQLEXPRESS");
+    row("SQLOLEDB.1", "db1", "SERVER=db1");
 }
 
 void TestConnectionString::parseSqlServer() {
     QFETCH(QString, provider);
     QFETCH(QString, dataSource);
-    QFETCH(QString, odbc);
+    QFETCH(QString, server);
     test::TestEnv env;
     qunsetenv("ZORVANE_ODBC_DRIVER");
     SetProvider(provider);
@@ -141,10 +89,9 @@ void TestConnectionString::parseSqlServer() {
     const ServerConnectionParams p =
         ParseConnectionString(GetConnectionByDbName(QStringLiteral("OFFICE")));
     QCOMPARE(p.driver, QStringLiteral("QODBC"));
-    QCOMPARE(p.database, QStringLiteral("OFFICE7"));
-    QCOMPARE(p.password, QStringLiteral("a;b"));
     QCOMPARE(p.connectTimeout, 30);
-    QCOMPARE(p.odbcConnectionString, odbc);
+    QCOMPARE(p.odbcConnectionString, QStringLiteral("DRIVER={FreeTDS};") + server +
+                                         QStringLiteral(";DATABASE=OFFICE7;UID=sa;PWD={a;b};"));
 }
 
 void TestConnectionString::odbcDriverFromEnvironment() {
@@ -159,63 +106,42 @@ void TestConnectionString::odbcDriverFromEnvironment() {
                             "MARS_Connection=yes;DATABASE=BM5;UID=u;PWD=;"));
 }
 
+// The host, port and password the PostgreSQL driver is given.
 void TestConnectionString::parsePostgres_data() {
     QTest::addColumn<QString>("dataSource");
-    QTest::addColumn<QString>("host");
-    QTest::addColumn<int>("port");
-    QTest::newRow("host") << "pg.local"
-                          << "pg.local" << -1;
-    QTest::newRow("host,port") << "pg.local,5433"
-                               << "pg.local" << 5433;
-    QTest::newRow("socket folder") << "/run/postgresql"
-                                   << "/run/postgresql" << -1;
-    QTest::newRow("socket folder,port") << "/tmp/pg x,55432"
-                                        << "/tmp/pg x" << 55432;
+    QTest::addColumn<QString>("password");
+    QTest::addColumn<QString>("expected");
+    const auto row = [](const char* name, const char* dataSource, const char* password,
+                        const char* expected) {
+        QTest::newRow(name) << QString::fromLatin1(dataSource) << QString::fromLatin1(password)
+                            << QString::fromLatin1(expected);
+    };
+    row("host", "pg.local", "", "pg.local|-1|");
+    row("host,port", "pg.local,5433", "a;b", "pg.local|5433|a;b");
+    row("socket folder", "/run/postgresql", " pw", "/run/postgresql|-1| pw");
+    row("socket folder,port", "/tmp/pg x,55432", "pw ", "/tmp/pg x|55432|pw ");
+    row("leading tab", "h", "\tpw", "h|-1|\tpw");
+    row("leading double quote", "h", "\"pw;", "h|-1|\"pw;");
+    row("leading apostrophe", "h", "'pw", "h|-1|'pw");
+    row("both quotes", "h", "'x\";y\"", "h|-1|'x\";y\"");
 }
 
 void TestConnectionString::parsePostgres() {
     QFETCH(QString, dataSource);
-    QFETCH(QString, host);
-    QFETCH(int, port);
+    QFETCH(QString, password);
+    QFETCH(QString, expected);
     test::TestEnv env;
     SetProvider(QStringLiteral("PostgreSQL"));
     SetDataSource(dataSource);
     SetUserID(QStringLiteral("postgres"));
+    SetPassWord(password);
     SetVolnaGlobNum(QStringLiteral("23"));
     const ServerConnectionParams p =
         ParseConnectionString(GetConnectionByDbName(QStringLiteral("ZORVA")));
     QCOMPARE(p.driver, QStringLiteral("QPSQL"));
-    QCOMPARE(p.host, host);
-    QCOMPARE(p.port, port);
+    QCOMPARE(QStringLiteral("%1|%2|%3").arg(p.host).arg(p.port).arg(p.password), expected);
     QCOMPARE(p.database, QStringLiteral("ZORVA23"));
     QCOMPARE(p.user, QStringLiteral("postgres"));
-    QCOMPARE(p.password, QString());
-    QCOMPARE(p.connectTimeout, 30);
-}
-
-void TestConnectionString::roundTripOfQuotedValues_data() {
-    QTest::addColumn<QString>("password");
-    QTest::newRow("semicolon") << "a;b";
-    QTest::newRow("leading blank") << " pw";
-    QTest::newRow("trailing blank") << "pw ";
-    QTest::newRow("leading tab") << "\tpw";
-    QTest::newRow("leading double quote") << "\"pw;";
-    QTest::newRow("leading apostrophe") << "'pw";
-    QTest::newRow("both quotes") << "'x\";y\"";
-    QTest::newRow("plain with equals") << "a=b";
-}
-
-void TestConnectionString::roundTripOfQuotedValues() {
-    QFETCH(QString, password);
-    test::TestEnv env;
-    SetProvider(QStringLiteral("PostgreSQL"));
-    SetDataSource(QStringLiteral("h"));
-    SetUserID(QStringLiteral("u"));
-    SetPassWord(password);
-    const ServerConnectionParams p =
-        ParseConnectionString(GetConnectionByDbName(QStringLiteral("BM")));
-    QCOMPARE(p.password, password);
-    QCOMPARE(p.user, QStringLiteral("u"));
 }
 
 void TestConnectionString::unknownProvider() {
@@ -227,69 +153,32 @@ void TestConnectionString::unknownProvider() {
     }
 }
 
+// The server test runs every text of the suite through the rewrite on a real server; these
+// are the rewrites whose exact form matters.
 void TestConnectionString::adapter_data() {
     QTest::addColumn<QString>("tsql");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("USE") << "USE MDOCS23"
-                         << "DO $zv$BEGIN IF current_database() <> 'MDOCS23' THEN RAISE "
-                            "EXCEPTION '%', 'Database ''MDOCS23'' is not the database of this "
-                            "connection.'; END IF; END$zv$";
-    QTest::newRow("DOCS by path") << "SELECT * FROM DOCS WHERE [FullName]='\\DOCS\\[1]\\a''b.doc'"
-                                  << "SELECT * FROM DOCS WHERE FullName='\\DOCS\\[1]\\a''b.doc'";
-    QTest::newRow("UMEMO delete")
-        << "DELETE FROM UMEMO WHERE ([MTYPE]=31 OR [MTYPE]=32) AND [ID]=1234"
-        << "DELETE FROM UMEMO WHERE (MTYPE=31 OR MTYPE=32) AND ID=1234";
-    QTest::newRow("UMEMO empty") << "SELECT * FROM UMEMO WHERE 1=0"
-                                 << "SELECT * FROM UMEMO WHERE 1=0";
-    QTest::newRow("MTIK") << "SELECT * FROM [MTIK] WHERE [SHOW]=1 ORDER BY [ID]"
-                          << "SELECT * FROM MTIK WHERE SHOW=1 ORDER BY ID";
-    QTest::newRow("OFF_CODE") << "SELECT * FROM [OFF_CODE] WHERE [CODE]=20 ORDER BY [NUM]"
-                              << "SELECT * FROM OFF_CODE WHERE CODE=20 ORDER BY NUM";
-    QTest::newRow("DOCSTATUS") << "SELECT * FROM [DOCSTATUS] ORDER BY ORD"
-                               << "SELECT * FROM DOCSTATUS ORDER BY ORD";
-    QTest::newRow("CLIENT by number") << "SELECT * FROM [CLIENT] WHERE [NUM]='O''Neil'"
-                                      << "SELECT * FROM CLIENT WHERE NUM='O''Neil'";
-    QTest::newRow("CLIENT list") << "SELECT * FROM [CLIENT] ORDER BY NUM"
-                                 << "SELECT * FROM CLIENT ORDER BY NUM";
-    QTest::newRow("CLIENT search")
-        << "SELECT * FROM [CLIENT] WHERE [NUM] LIKE '%a[b]%' OR [F_NAME] LIKE '%a[b]%' OR "
-           "[L_NAME] LIKE '%a[b]%' OR [TELEFON] LIKE '%a[b]%' ORDER BY NUM"
-        << "SELECT * FROM CLIENT WHERE NUM::text ILIKE '%a[b]%' OR F_NAME::text ILIKE "
-           "'%a[b]%' OR L_NAME::text ILIKE '%a[b]%' OR TELEFON::text ILIKE '%a[b]%' ORDER BY "
-           "NUM";
-    QTest::newRow("LOOKFOR empty") << "SELECT * FROM [LOOKFOR] WHERE 1=0"
-                                   << "SELECT * FROM LOOKFOR WHERE 1=0";
-    QTest::newRow("LOOKFOR client search")
-        << "SELECT * FROM [LOOKFOR] WHERE [LakNum]='12' AND [OptKey] IN (1,2,3,4,5,6,10,11) AND "
-           "([F_NAME] LIKE '%x%' OR [L_NAME] LIKE '%x%' OR [TELEFON] LIKE '%x%' OR [TIK] LIKE "
-           "'%x%') ORDER BY OptKey, Tik"
-        << "SELECT * FROM LOOKFOR WHERE LakNum='12' AND OptKey IN (1,2,3,4,5,6,10,11) AND "
-           "(F_NAME::text ILIKE '%x%' OR L_NAME::text ILIKE '%x%' OR TELEFON::text ILIKE '%x%' "
-           "OR TIK::text ILIKE '%x%') ORDER BY OptKey, Tik";
-    QTest::newRow("LOOKFOR all search")
-        << "SELECT * FROM [LOOKFOR] WHERE [OptKey] IN (0,1,2,3,4,5,6,10,11) AND [F_NAME] LIKE "
-           "'%x%' OR [L_NAME] LIKE '%x%' ORDER BY OptKey, Tik"
-        << "SELECT * FROM LOOKFOR WHERE OptKey IN (0,1,2,3,4,5,6,10,11) AND F_NAME::text "
-           "ILIKE '%x%' OR L_NAME::text ILIKE '%x%' ORDER BY OptKey, Tik";
-    QTest::newRow("LOOKFOR client")
-        << "SELECT * FROM [LOOKFOR] WHERE [LakNum]='12' AND [OptKey] IN (1,2,3,4,5,6,10,11) "
-           "ORDER BY OptKey, Tik"
-        << "SELECT * FROM LOOKFOR WHERE LakNum='12' AND OptKey IN (1,2,3,4,5,6,10,11) ORDER BY "
-           "OptKey, Tik";
-    QTest::newRow("LOOKFOR all")
-        << "SELECT * FROM [LOOKFOR] WHERE [OptKey] IN (0,1,2,3,4,5,6,10,11) ORDER BY OptKey, "
-           "LakNum"
-        << "SELECT * FROM LOOKFOR WHERE OptKey IN (0,1,2,3,4,5,6,10,11) ORDER BY OptKey, LakNum";
-    QTest::newRow("reposition with doubled blanks")
-        << "SELECT TOP 1 *  FROM [DOCS]  ORDER BY ID DESC"
-        << "SELECT *  FROM DOCS  ORDER BY ID DESC LIMIT 1";
-    QTest::newRow("NOT LIKE, literal LIKE untouched")
-        << "SELECT * FROM T WHERE [A] NOT LIKE 'LIKE [x]'"
-        << "SELECT * FROM T WHERE A::text NOT ILIKE 'LIKE [x]'";
-    QTest::newRow("word containing LIKE") << "SELECT LIKES FROM T"
-                                          << "SELECT LIKES FROM T";
-    QTest::newRow("odd identifier") << "SELECT [My Col] FROM T"
-                                    << "SELECT \"my col\" FROM T";
+    const auto row = [](const char* name, const char* tsql, const char* expected) {
+        QTest::newRow(name) << QString::fromLatin1(tsql) << QString::fromLatin1(expected);
+    };
+    row("USE", "USE MDOCS23",
+        "DO $zv$BEGIN IF current_database() <> 'MDOCS23' THEN RAISE "
+        "EXCEPTION '%', 'Database ''MDOCS23'' is not the database of this "
+        "connection.'; END IF; END$zv$");
+    row("DOCS by path", "SELECT * FROM DOCS WHERE [FullName]='\\DOCS\\[1]\\a''b.doc'",
+        "SELECT * FROM DOCS WHERE FullName='\\DOCS\\[1]\\a''b.doc'");
+    row("CLIENT search",
+        "SELECT * FROM [CLIENT] WHERE [NUM] LIKE '%a[b]%' OR [F_NAME] LIKE '%a[b]%' OR "
+        "[L_NAME] LIKE '%a[b]%' OR [TELEFON] LIKE '%a[b]%' ORDER BY NUM",
+        "SELECT * FROM CLIENT WHERE NUM::text ILIKE '%a[b]%' OR F_NAME::text ILIKE "
+        "'%a[b]%' OR L_NAME::text ILIKE '%a[b]%' OR TELEFON::text ILIKE '%a[b]%' ORDER BY "
+        "NUM");
+    row("reposition with doubled blanks", "SELECT TOP 1 *  FROM [DOCS]  ORDER BY ID DESC",
+        "SELECT *  FROM DOCS  ORDER BY ID DESC LIMIT 1");
+    row("NOT LIKE, literal LIKE untouched", "SELECT * FROM T WHERE [A] NOT LIKE 'LIKE [x]'",
+        "SELECT * FROM T WHERE A::text NOT ILIKE 'LIKE [x]'");
+    row("word containing LIKE", "SELECT LIKES FROM T", "SELECT LIKES FROM T");
+    row("odd identifier", "SELECT [My Col] FROM T", "SELECT \"my col\" FROM T");
 }
 
 void TestConnectionString::adapter() {

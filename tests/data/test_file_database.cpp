@@ -12,36 +12,15 @@
 #include "data/database.h"
 #include "data/jet_functions.h"
 #include "data/recordset.h"
+#include "recordset_checks.h"
 #include "sqlite_files.h"
 #include "test_env.h"
 #include "util/errors.h"
 #include "util/state.h"
 
 using namespace zv;
-
-namespace {
-
-long ErrorOf(const std::function<void()>& f) {
-    try {
-        f();
-    } catch (const VbError& e) {
-        return e.Number();
-    }
-    return 0;
-}
-
-QStringList Column(Recordset& rs, const QString& field) {
-    QStringList values;
-    if (rs.RecordCount() == 0) {
-        return values;
-    }
-    for (rs.MoveFirst(); !rs.EOF(); rs.MoveNext()) {
-        values << rs.Value(field).toString();
-    }
-    return values;
-}
-
-}  // namespace
+using test::Column;
+using test::ErrorOf;
 
 class TestFileDatabase : public QObject {
     Q_OBJECT
@@ -60,17 +39,13 @@ class TestFileDatabase : public QObject {
     void jetLikeFoldsEveryCodeUnit();
     void likeFunction_data();
     void likeFunction();
-    void jetVal_data();
     void jetVal();
     void booleansAndDates();
-    void duplicateIs3022();
     void writerWaitsForAShortLock();
     void lockedPastTimeoutIs3260();
     void navigation();
     void editingRules();
-    void snapshotIsReadOnly();
     void updateByUniqueIndexWithoutPrimaryKey();
-    void cloneHasItsOwnPosition();
 
   private:
     std::unique_ptr<test::TestEnv> env_;
@@ -107,14 +82,6 @@ void TestFileDatabase::init() {
         {QStringLiteral("CREATE TABLE UMEMO (MemoNum INTEGER PRIMARY KEY, ID INTEGER, MTYPE "
                         "INTEGER, USER97 TEXT, METAPEL TEXT)"),
          QStringLiteral("INSERT INTO UMEMO (ID, MTYPE) VALUES (5,31),(5,32),(5,33),(6,31)")});
-    test::MakeFileDb(
-        main_, QStringLiteral("PUB"),
-        {QStringLiteral("CREATE TABLE USERS (USERCODE TEXT, ST_NUMBER TEXT, NAME TEXT)"),
-         QStringLiteral("INSERT INTO USERS VALUES ('L1','12','c'),('L1','3','a'),('L1','',"
-                        "'z'),('L2','1','x')")});
-    test::MakeFileDb(main_, QStringLiteral("MAIN"),
-                     {QStringLiteral("CREATE TABLE MSql (ClientID TEXT, IsOffice BOOLEAN)"),
-                      QStringLiteral("INSERT INTO MSql VALUES ('23', 1)")});
 }
 
 void TestFileDatabase::cleanup() {
@@ -123,33 +90,23 @@ void TestFileDatabase::cleanup() {
 
 void TestFileDatabase::missingFileIsAnErrorAndNotCreated() {
     QFile::remove(main_ + QStringLiteral("/OFFICE.MDB"));
-    try {
-        Database::OpenFile(QStringLiteral("\\OFFICE.MDB"));
-        QFAIL("opened a missing file");
-    } catch (const VbError& e) {
-        QCOMPARE(e.Number(), err::JetCannotOpen);
-        QVERIFY2(e.Description().contains(QStringLiteral("OFFICE.MDB")),
-                 qPrintable(e.Description()));
-    }
+    QCOMPARE(ErrorOf([] { Database::OpenFile(QStringLiteral("\\OFFICE.MDB")); }),
+             err::JetCannotOpen);
     QVERIFY(!QFile::exists(main_ + QStringLiteral("/OFFICE.MDB")));
     QCOMPARE(ErrorOf([] { Database::Open(QStringLiteral("ZORVA"), false); }), err::JetCannotOpen);
 }
 
+// Each open is a connection of its own; a recordset keeps its rows after its database closes.
 void TestFileDatabase::eachOpenHasItsOwnConnection() {
     const QStringList before = QSqlDatabase::connectionNames();
     auto a = Database::OpenFile(QStringLiteral("\\OFFICE.MDB"));
     auto b = Database::Open(QStringLiteral("OFFICE"), false);
     QVERIFY(a->ConnectionName() != b->ConnectionName());
-    QCOMPARE(a->Kind(), DbKind::File);
     auto rs = a->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK]"));
     GClose(a);
-    // The recordset keeps working after its database is closed; its rows are its own.
     QCOMPARE(rs->RecordCount(), 3);
-    QCOMPARE(b->OpenRecordset(QStringLiteral("SELECT * FROM CLIENT"))->RecordCount(), 3);
     GClose(rs);
     GClose(b);
-    GClose(b);
-    QVERIFY(!b);
     QCOMPARE(QSqlDatabase::connectionNames(), before);
 }
 
@@ -161,57 +118,45 @@ void TestFileDatabase::folderWithHebrewAndUriCharacters() {
     QCOMPARE(db->OpenRecordset(QStringLiteral("SELECT * FROM USERS"))->FieldCount(), 1);
 }
 
+// Expected: the field's values, joined by ",".
 void TestFileDatabase::jetTexts_data() {
     QTest::addColumn<QString>("db");
     QTest::addColumn<QString>("sql");
     QTest::addColumn<QString>("field");
-    QTest::addColumn<QStringList>("expected");
-    QTest::newRow("WHERE FALSE") << "BM"
-                                 << "SELECT * FROM UMEMO WHERE FALSE"
-                                 << "ID" << QStringList{};
-    QTest::newRow("[SHOW]=True") << "OFFICE"
-                                 << "SELECT * FROM [MTIK] WHERE [SHOW]=True ORDER BY [ID]"
-                                 << "TEUR" << QStringList{"גירושין", "Lease"};
-    QTest::newRow("double-quoted text and Val order")
-        << "MADAD"
-        << "SELECT * FROM [TRANS_CODE] WHERE [TABLE_NUM]=\"1080\" ORDER BY Val([KOD_NUM_1]);"
-        << "Teur" << QStringList{"a", "b", "c"};
-    QTest::newRow("max(ID)") << "MDOCS"
-                             << "SELECT max(ID) FROM [DOCS]"
-                             << "max(ID)" << QStringList{"12"};
-    QTest::newRow("client by number") << "OFFICE"
-                                      << "SELECT * FROM [CLIENT] WHERE [NUM]='101'"
-                                      << "F_NAME" << QStringList{"Anna"};
-    QTest::newRow("client search")
-        << "OFFICE"
-        << "SELECT * FROM [CLIENT] WHERE [F_NAME] LIKE '*smi*' OR [L_NAME] LIKE '*smi*' OR "
-           "[TELEFON] LIKE '*smi*' OR [NUM] LIKE '*smi*' ORDER BY NUM"
-        << "NUM" << QStringList{"101"};
-    QTest::newRow("client search Hebrew")
-        << "OFFICE"
-        << "SELECT * FROM [CLIENT] WHERE [F_NAME] LIKE '*כה*' OR [L_NAME] LIKE '*כה*' ORDER BY NUM"
-        << "NUM" << QStringList{"100"};
-    QTest::newRow("users by Val") << "PUB"
-                                  << "SELECT * FROM [USERS] WHERE [USERCODE] ='L1' ORDER BY "
-                                     "VAL([ST_NUMBER])"
-                                  << "NAME" << QStringList{"z", "a", "c"};
-    QTest::newRow("MSql row") << "MAIN"
-                              << "SELECT * FROM MSql Where [ClientID]='23'"
-                              << "ClientID" << QStringList{"23"};
-    QTest::newRow("DOCS by path, no case") << "MDOCS"
-                                           << "SELECT * FROM DOCS WHERE [FullName]='\\docs\\B.DOC'"
-                                           << "ID" << QStringList{"12"};
+    QTest::addColumn<QString>("expected");
+    const auto row = [](const char* name, const char* db, const char* sql, const char* field,
+                        const char* expected) {
+        QTest::newRow(name) << QString::fromLatin1(db) << QString::fromUtf8(sql)
+                            << QString::fromLatin1(field) << QString::fromUtf8(expected);
+    };
+    row("WHERE FALSE", "BM", "SELECT * FROM UMEMO WHERE FALSE", "ID", "");
+    row("[SHOW]=True", "OFFICE", "SELECT * FROM [MTIK] WHERE [SHOW]=True ORDER BY [ID]", "TEUR",
+        "גירושין,Lease");
+    row("double-quoted text and Val order", "MADAD",
+        "SELECT * FROM [TRANS_CODE] WHERE [TABLE_NUM]=\"1080\" ORDER BY Val([KOD_NUM_1]);", "Teur",
+        "a,b,c");
+    row("max(ID)", "MDOCS", "SELECT max(ID) FROM [DOCS]", "max(ID)", "12");
+    row("client by number", "OFFICE", "SELECT * FROM [CLIENT] WHERE [NUM]='101'", "F_NAME", "Anna");
+    row("client search", "OFFICE",
+        "SELECT * FROM [CLIENT] WHERE [F_NAME] LIKE '*smi*' OR [L_NAME] LIKE '*smi*' OR "
+        "[TELEFON] LIKE '*smi*' OR [NUM] LIKE '*smi*' ORDER BY NUM",
+        "NUM", "101");
+    row("client search Hebrew", "OFFICE",
+        "SELECT * FROM [CLIENT] WHERE [F_NAME] LIKE '*כה*' OR [L_NAME] LIKE '*כה*' ORDER BY NUM",
+        "NUM", "100");
+    row("DOCS by path, no case", "MDOCS", "SELECT * FROM DOCS WHERE [FullName]='\\docs\\B.DOC'",
+        "ID", "12");
 }
 
 void TestFileDatabase::jetTexts() {
     QFETCH(QString, db);
     QFETCH(QString, sql);
     QFETCH(QString, field);
-    QFETCH(QStringList, expected);
+    QFETCH(QString, expected);
     auto d = Database::Open(db, false);
     auto rs = d->OpenRecordset(sql, dbOpenSnapshot);
     QVERIFY(rs->HasField(field));
-    QCOMPARE(Column(*rs, field), expected);
+    QCOMPARE(Column(*rs, field).join(QLatin1Char(',')), expected);
 }
 
 void TestFileDatabase::deleteStar() {
@@ -226,82 +171,38 @@ void TestFileDatabase::jetLike_data() {
     QTest::addColumn<QString>("pattern");
     QTest::addColumn<QString>("text");
     QTest::addColumn<bool>("match");
-    QTest::newRow("any run") << "*ab*"
-                             << "xxABxx" << true;
-    QTest::newRow("any run none") << "*ab*"
-                                  << "xxaxbx" << false;
-    QTest::newRow("percent is literal") << "%ab%"
-                                        << "xabx" << false;
-    QTest::newRow("percent matches itself") << "1%"
-                                            << "1%" << true;
-    QTest::newRow("one char") << "a?c"
-                              << "abc" << true;
-    QTest::newRow("one char too short") << "a?c"
-                                        << "ac" << false;
-    QTest::newRow("digit") << "#-#"
-                           << "5-7" << true;
-    QTest::newRow("digit rejects letter") << "#"
-                                          << "x" << false;
-    QTest::newRow("class") << "[abc]x"
-                           << "Bx" << true;
-    QTest::newRow("range") << "[a-f]1"
-                           << "e1" << true;
-    QTest::newRow("negated class") << "[!a-f]1"
-                                   << "g1" << true;
-    QTest::newRow("negated class rejects") << "[!a-f]1"
-                                           << "c1" << false;
-    QTest::newRow("bracketed star is literal") << "a[*]"
-                                               << "a*" << true;
-    QTest::newRow("bracketed star rejects") << "a[*]"
-                                            << "ab" << false;
-    QTest::newRow("underscore is literal") << "a_c"
-                                           << "abc" << false;
-    QTest::newRow("Hebrew") << "*שה*"
-                            << "משה" << true;
-    QTest::newRow("whole text") << "abc"
-                                << "abcd" << false;
-    QTest::newRow("stars everywhere") << "*a*b*c*"
-                                      << "xaxbxcx" << true;
-    QTest::newRow("empty pattern") << ""
-                                   << "" << true;
-    QTest::newRow("letter outside the basic plane") << "\U00010410*"
-                                                    << "\U00010410x" << true;
-    QTest::newRow("empty pattern, some text") << ""
-                                              << "a" << false;
-    QTest::newRow("star, empty text") << "*"
-                                      << "" << true;
-    QTest::newRow("stars in a row") << "a**b"
-                                    << "ab" << true;
-    QTest::newRow("whole text, mixed case") << "ÀbÇ"
-                                            << "àBç" << true;
-    QTest::newRow("prefix, mixed case") << "o'NE*"
-                                        << "O'Neil" << true;
-    QTest::newRow("prefix longer than text") << "abcd*"
-                                             << "abc" << false;
-    QTest::newRow("suffix, mixed case") << "*NEIL"
-                                        << "O'Neil" << true;
-    QTest::newRow("suffix longer than text") << "*abc"
-                                             << "bc" << false;
-    QTest::newRow("contains at the end") << "*eIL*"
-                                         << "O'Neil" << true;
-    QTest::newRow("contains after a false start") << "*aab*"
-                                                  << "aaab" << true;
-    QTest::newRow("contains longer than text") << "*abc*"
-                                               << "ab" << false;
-    QTest::newRow("Hebrew prefix") << "כה*"
-                                   << "כהן" << true;
-    QTest::newRow("Hebrew final letter is its own") << "*כהנ*"
-                                                    << "כהן" << false;
-    QTest::newRow("Hebrew and Latin") << "*COHEN כהן*"
-                                      << "Cohen כהן 2" << true;
-    QTest::newRow("sign that folds to a Latin letter") << "*k*"
-                                                       << "5 \u212A" << true;
-    QTest::newRow("class inside stars") << "*[ab]*"
-                                        << "xBx" << true;
-    QTest::newRow("unclosed bracket is literal") << "*[a*"
-                                                 << "x[Ab" << true;
-    QTest::newRow("empty class matches nothing") << "*[]*"
-                                                 << "ab" << false;
+    const auto row = [](const char* name, const char* pattern, const char* text, bool match) {
+        QTest::newRow(name) << QString::fromUtf8(pattern) << QString::fromUtf8(text) << match;
+    };
+    row("any run", "*ab*", "xxABxx", true);
+    row("percent is literal", "%ab%", "xabx", false);
+    row("percent matches itself", "1%", "1%", true);
+    row("one char", "a?c", "abc", true);
+    row("digit", "#-#", "5-7", true);
+    row("class", "[abc]x", "Bx", true);
+    row("range", "[a-f]1", "e1", true);
+    row("negated class", "[!a-f]1", "g1", true);
+    row("bracketed star is literal", "a[*]", "a*", true);
+    row("underscore is literal", "a_c", "abc", false);
+    row("whole text", "abc", "abcd", false);
+    row("empty pattern", "", "", true);
+    row("empty pattern, some text", "", "a", false);
+    row("star, empty text", "*", "", true);
+    row("stars in a row", "a**b", "ab", true);
+    row("letter outside the basic plane", "\U00010410*", "\U00010410x", true);
+    row("whole text, mixed case", "ÀbÇ", "àBç", true);
+    row("prefix, mixed case", "o'NE*", "O'Neil", true);
+    row("prefix longer than text", "abcd*", "abc", false);
+    row("suffix, mixed case", "*NEIL", "O'Neil", true);
+    row("suffix longer than text", "*abc", "bc", false);
+    row("contains after a false start", "*aab*", "aaab", true);
+    row("contains longer than text", "*abc*", "ab", false);
+    row("Hebrew final letter is its own", "*כהנ*", "כהן", false);
+    row("Hebrew and Latin", "*COHEN כהן*", "Cohen כהן 2", true);
+    row("sign that folds to a Latin letter", "*k*", "5 \u212A", true);
+    row("class inside stars", "*[ab]*", "xBx", true);
+    row("unclosed bracket is literal", "*[a*", "x[Ab", true);
+    row("empty class matches nothing", "*[]*", "ab", false);
 }
 
 void TestFileDatabase::jetLike() {
@@ -332,35 +233,26 @@ void TestFileDatabase::jetLikeFoldsEveryCodeUnit() {
 void TestFileDatabase::likeFunction_data() {
     QTest::addColumn<QString>("sql");
     QTest::addColumn<QString>("result");
-    QTest::newRow("NULL text") << "SELECT NULL LIKE 'a*'"
-                               << "NULL";
-    QTest::newRow("NULL pattern") << "SELECT 'a' LIKE NULL"
-                                  << "NULL";
-    QTest::newRow("escape") << "SELECT 'a*' LIKE 'a!*' ESCAPE '!', 'ab' LIKE 'a!*' ESCAPE '!'"
-                            << "1,0";
-    QTest::newRow("NULL escape is none") << "SELECT 'a!b' LIKE 'a!*' ESCAPE NULL"
-                                         << "1";
-    QTest::newRow("escape of two characters") << "SELECT 'a' LIKE 'a' ESCAPE '!!'"
-                                              << "ESCAPE expression must be a single character";
-    QTest::newRow("number as text") << "SELECT 12345 LIKE '*34*'"
-                                    << "1";
-    QTest::newRow("letter outside the basic plane is two characters")
-        << "SELECT 'a\U00010410b' LIKE 'a??b'"
-        << "1";
-    QTest::newRow("malformed text as SQLite reads it")
-        << "SELECT CAST(x'61C3A980' AS TEXT) LIKE '*\u00E9*'"
-        << "0";
-    QTest::newRow("byte that is no UTF-8") << "SELECT CAST(x'41FF' AS TEXT) LIKE 'a?'"
-                                           << "1";
-    QTest::newRow("text longer than a name")
-        << "SELECT replace(hex(zeroblob(200)), '0', 'a') || 'B' LIKE '*b'"
-        << "1";
-    QTest::newRow("same pattern on every row") << "SELECT t LIKE '*B*' FROM r"
-                                               << "1,0,1,0";
-    QTest::newRow("pattern of each row") << "SELECT t LIKE p FROM r"
-                                         << "1,0,1,0";
-    QTest::newRow("escape of each row") << "SELECT t LIKE 'a!*' ESCAPE e FROM r"
-                                        << "0,0,0,1";
+    const auto row = [](const char* name, const char* sql, const char* result) {
+        QTest::newRow(name) << QString::fromUtf8(sql) << QString::fromUtf8(result);
+    };
+    row("NULL text", "SELECT NULL LIKE 'a*'", "NULL");
+    row("NULL pattern", "SELECT 'a' LIKE NULL", "NULL");
+    row("escape", "SELECT 'a*' LIKE 'a!*' ESCAPE '!', 'ab' LIKE 'a!*' ESCAPE '!'", "1,0");
+    row("NULL escape is none", "SELECT 'a!b' LIKE 'a!*' ESCAPE NULL", "1");
+    row("escape of two characters", "SELECT 'a' LIKE 'a' ESCAPE '!!'",
+        "ESCAPE expression must be a single character");
+    row("number as text", "SELECT 12345 LIKE '*34*'", "1");
+    row("letter outside the basic plane is two characters", "SELECT 'a\U00010410b' LIKE 'a??b'",
+        "1");
+    row("malformed text as SQLite reads it", "SELECT CAST(x'61C3A980' AS TEXT) LIKE '*\u00E9*'",
+        "0");
+    row("byte that is no UTF-8", "SELECT CAST(x'41FF' AS TEXT) LIKE 'a?'", "1");
+    row("text longer than a name", "SELECT replace(hex(zeroblob(200)), '0', 'a') || 'B' LIKE '*b'",
+        "1");
+    row("same pattern on every row", "SELECT t LIKE '*B*' FROM r", "1,0,1,0");
+    row("pattern of each row", "SELECT t LIKE p FROM r", "1,0,1,0");
+    row("escape of each row", "SELECT t LIKE 'a!*' ESCAPE e FROM r", "0,0,0,1");
 }
 
 // The registered function straight on a connection: NULLs, the escape, and a pattern
@@ -395,70 +287,35 @@ void TestFileDatabase::likeFunction() {
     QCOMPARE(values.join(QLatin1Char(',')), result);
 }
 
-void TestFileDatabase::jetVal_data() {
-    QTest::addColumn<QString>("text");
-    QTest::addColumn<double>("value");
-    QTest::newRow("digits") << "12" << 12.0;
-    QTest::newRow("blanks inside") << " 1 2 3" << 123.0;
-    QTest::newRow("stops at letter") << "12ab3" << 12.0;
-    QTest::newRow("decimal") << "-3.25x" << -3.25;
-    QTest::newRow("exponent") << "1e3" << 1000.0;
-    QTest::newRow("hex") << "&H1F" << 31.0;
-    QTest::newRow("octal") << "&O17" << 15.0;
-    QTest::newRow("empty") << "" << 0.0;
-    QTest::newRow("letters") << "abc" << 0.0;
-}
-
 void TestFileDatabase::jetVal() {
-    QFETCH(QString, text);
-    QFETCH(double, value);
-    QCOMPARE(JetVal(text), value);
+    QCOMPARE(JetVal(QStringLiteral(" 1 2 3")), 123.0);
+    QCOMPARE(JetVal(QStringLiteral("12ab3")), 12.0);
+    QCOMPARE(JetVal(QStringLiteral("-3.25x")), -3.25);
+    QCOMPARE(JetVal(QStringLiteral("1e3")), 1000.0);
+    QCOMPARE(JetVal(QStringLiteral("&H1F")), 31.0);
+    QCOMPARE(JetVal(QStringLiteral("&O17")), 15.0);
+    QCOMPARE(JetVal(QString()), 0.0);
+    QCOMPARE(JetVal(QStringLiteral("abc")), 0.0);
 }
 
 void TestFileDatabase::booleansAndDates() {
     auto db = Database::OpenFile(QStringLiteral("\\MDOCS.MDB"));
     auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE FALSE"));
-    const QDateTime created(QDate(2026, 3, 1), QTime(9, 30, 5));
+    const QDateTime created(QDate(1899, 12, 30), QTime(9, 30, 5));
     rs->AddNew();
     rs->SetValue(QStringLiteral("ID"), 20);
     rs->SetValue(QStringLiteral("IsMemo"), false);
     rs->SetValue(QStringLiteral("DateCreated"), created);
     rs->Update();
-    rs->AddNew();
-    rs->SetValue(QStringLiteral("ID"), 21);
-    rs->SetValue(QStringLiteral("IsMemo"), true);
-    rs->SetValue(QStringLiteral("DateCreated"), QDateTime(QDate(1899, 12, 30), QTime(0, 0)));
-    rs->Update();
-    GClose(rs);
-    GClose(db);
     QCOMPARE(test::QueryFileDb(main_, "MDOCS",
                                "SELECT IsMemo || '|' || DateCreated FROM DOCS WHERE ID=20"),
-             QStringLiteral("0|2026-03-01 09:30:05"));
-    QCOMPARE(test::QueryFileDb(main_, "MDOCS",
-                               "SELECT IsMemo || '|' || DateCreated FROM DOCS WHERE ID=21"),
-             QStringLiteral("1|1899-12-30 00:00:00"));
-    db = Database::OpenFile(QStringLiteral("\\MDOCS.MDB"));
-    rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE ID>=20 ORDER BY ID"));
+             QStringLiteral("0|1899-12-30 09:30:05"));
+    rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE ID>=12 ORDER BY ID"));
+    QCOMPARE(rs->Value(QStringLiteral("ismemo")), QVariant(true));  // the column default
+    QVERIFY(rs->Value(QStringLiteral("DateCreated")).isNull());
+    rs->MoveNext();
     QCOMPARE(rs->Value(QStringLiteral("DateCreated")).toDateTime(), created);
     QCOMPARE(rs->Value(QStringLiteral("IsMemo")), QVariant(false));
-    rs->MoveNext();
-    QCOMPARE(rs->Value(QStringLiteral("IsMemo")), QVariant(true));
-    rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE ID=7"));
-    QVERIFY(rs->Value(QStringLiteral("DateCreated")).isNull());
-    QCOMPARE(rs->Value(QStringLiteral("ismemo")), QVariant(true));  // the column default
-}
-
-void TestFileDatabase::duplicateIs3022() {
-    auto db = Database::OpenFile(QStringLiteral("\\MDOCS.MDB"));
-    auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE FALSE"));
-    rs->AddNew();
-    rs->SetValue(QStringLiteral("ID"), 12);
-    QCOMPARE(ErrorOf([&] { rs->Update(); }), err::JetDuplicate);
-    // The failed row stays pending, so a caller can change the key and save again.
-    QCOMPARE(rs->EditMode(), int(dbEditAdd));
-    rs->SetValue(QStringLiteral("ID"), 13);
-    rs->Update();
-    QCOMPARE(test::QueryFileDb(main_, "MDOCS", "SELECT count(*) FROM DOCS"), QStringLiteral("3"));
 }
 
 void TestFileDatabase::writerWaitsForAShortLock() {
@@ -501,28 +358,22 @@ void TestFileDatabase::lockedPastTimeoutIs3260() {
 void TestFileDatabase::navigation() {
     auto db = Database::OpenFile(QStringLiteral("\\OFFICE.MDB"));
     auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK] ORDER BY ID"));
-    QCOMPARE(rs->RecordCount(), 3);
-    QCOMPARE(rs->AbsolutePosition(), 0);
-    QVERIFY(!rs->BOF());
-    QCOMPARE(rs->Value(QStringLiteral("id")).toInt(), 1);
     const QVariant first = rs->Bookmark();
     rs->MoveLast();
-    QCOMPARE(rs->AbsolutePosition(), 2);
+    auto clone = rs->Clone();
+    QCOMPARE(clone->AbsolutePosition(), 0);
     rs->MoveNext();
     QVERIFY(rs->EOF());
     QCOMPARE(rs->AbsolutePosition(), -1);
     QCOMPARE(ErrorOf([&] { rs->Value(QStringLiteral("ID")); }), err::JetNoCurrentRecord);
     QCOMPARE(ErrorOf([&] { rs->MoveNext(); }), err::JetNoCurrentRecord);
     rs->SetBookmark(first);
-    QCOMPARE(rs->Value(QStringLiteral("ID")).toInt(), 1);
+    QCOMPARE(rs->Value(QStringLiteral("id")).toInt(), 1);
     rs->MovePrevious();
     QVERIFY(rs->BOF());
     QCOMPARE(ErrorOf([&] { rs->Value(QStringLiteral("NoSuchField")); }), err::JetNoField);
-    QCOMPARE(rs->Name(), QStringLiteral("SELECT * FROM [MTIK] ORDER BY ID"));
-
     auto empty = db->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK] WHERE FALSE"));
     QVERIFY(empty->BOF() && empty->EOF());
-    QCOMPARE(empty->RecordCount(), 0);
     QCOMPARE(empty->FieldCount(), 3);
     QCOMPARE(ErrorOf([&] { empty->MoveFirst(); }), err::JetNoCurrentRecord);
 }
@@ -530,16 +381,12 @@ void TestFileDatabase::navigation() {
 void TestFileDatabase::editingRules() {
     auto db = Database::OpenFile(QStringLiteral("\\OFFICE.MDB"));
     auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK] ORDER BY ID"));
-    QCOMPARE(ErrorOf([&] { rs->SetValue(QStringLiteral("TEUR"), "x"); }),
-             err::JetUpdateWithoutEdit);
     QCOMPARE(ErrorOf([&] { rs->Update(); }), err::JetUpdateWithoutEdit);
     rs->MoveNext();
     rs->Edit();
-    QCOMPARE(rs->EditMode(), int(dbEditInProgress));
     rs->SetValue(QStringLiteral("teur"), QStringLiteral("צוואה"));
     QCOMPARE(rs->Value(QStringLiteral("TEUR")).toString(), QStringLiteral("צוואה"));
     rs->Update();
-    QCOMPARE(rs->EditMode(), int(dbEditNone));
     QCOMPARE(rs->LastModified(), rs->Bookmark());
     QCOMPARE(test::QueryFileDb(main_, "OFFICE", "SELECT TEUR FROM MTIK WHERE ID=2"),
              QStringLiteral("צוואה"));
@@ -557,13 +404,10 @@ void TestFileDatabase::editingRules() {
     QCOMPARE(rs->Value(QStringLiteral("ID")).toInt(), 4);
     QCOMPARE(rs->Value(QStringLiteral("SHOW")), QVariant(false));
     QCOMPARE(rs->RecordCount(), 4);
-}
-
-void TestFileDatabase::snapshotIsReadOnly() {
-    auto db = Database::OpenFile(QStringLiteral("\\OFFICE.MDB"));
-    auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK]"), dbOpenSnapshot);
-    QCOMPARE(ErrorOf([&] { rs->Edit(); }), err::JetReadOnly);
-    QCOMPARE(ErrorOf([&] { rs->AddNew(); }), err::JetReadOnly);
+    // Snapshots and aggregates cannot be edited.
+    auto snapshot = db->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK]"), dbOpenSnapshot);
+    QCOMPARE(ErrorOf([&] { snapshot->Edit(); }), err::JetReadOnly);
+    QCOMPARE(ErrorOf([&] { snapshot->AddNew(); }), err::JetReadOnly);
     auto max = db->OpenRecordset(QStringLiteral("SELECT max(ID) FROM [MTIK]"));
     QCOMPARE(ErrorOf([&] { max->Edit(); }), err::JetReadOnly);
 }
@@ -578,18 +422,6 @@ void TestFileDatabase::updateByUniqueIndexWithoutPrimaryKey() {
     rs->Update();
     QCOMPARE(test::QueryFileDb(main_, "MDOCS", "SELECT group_concat(ID || ':' || Teur) FROM DOCS"),
              QStringLiteral("7:,12:שונה"));
-}
-
-void TestFileDatabase::cloneHasItsOwnPosition() {
-    auto db = Database::OpenFile(QStringLiteral("\\OFFICE.MDB"));
-    auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM [MTIK] ORDER BY ID"));
-    rs->MoveLast();
-    auto clone = rs->Clone();
-    QCOMPARE(clone->AbsolutePosition(), 0);
-    clone->SetBookmark(rs->Bookmark());
-    QCOMPARE(clone->Value(QStringLiteral("ID")).toInt(), 3);
-    clone->MoveFirst();
-    QCOMPARE(rs->AbsolutePosition(), 2);
 }
 
 QTEST_MAIN(TestFileDatabase)
