@@ -15,21 +15,16 @@ struct Result {
     QString err;
 };
 
-// Arguments are raw bytes, as the suite passes them; QProcess would re-encode text, so a
-// shell hands each argument over from a file.
+// Arguments are raw bytes, as the suite passes them; QProcess would re-encode text, so the
+// shell makes each one with printf.
 Result RunProgram(const QList<QByteArray>& args, const test::TestEnv& env) {
-    QTemporaryDir argDir;
     QString script = QStringLiteral("exec \"$0\"");
-    QStringList list{
-        QStringLiteral("-c"), QString(),
-        qEnvironmentVariable("ZV_TEST_BUILD_DIR") + QStringLiteral("/src/app/zorvane-filer")};
-    for (qsizetype i = 0; i < args.size(); ++i) {
-        const QString file = argDir.filePath(QString::number(i));
-        test::WriteFile(file, args.at(i));
-        script += QStringLiteral(" \"$(cat \"$%1\")\"").arg(i + 1);
-        list << file;
+    for (const QByteArray& arg : args) {
+        script += QStringLiteral(" \"$(printf '");
+        for (const char c : arg)
+            script += QStringLiteral("\\%1").arg(uchar(c), 3, 8, QLatin1Char('0'));
+        script += QStringLiteral("')\"");
     }
-    list[1] = script;
     QProcess p;
     QProcessEnvironment pe = QProcessEnvironment::systemEnvironment();
     pe.insert(QStringLiteral("XDG_CONFIG_HOME"), env.ConfigHome());
@@ -37,15 +32,15 @@ Result RunProgram(const QList<QByteArray>& args, const test::TestEnv& env) {
     pe.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
     pe.remove(QStringLiteral("ZORVANE_DEVELOPMENT_RUN"));
     p.setProcessEnvironment(pe);
-    p.start(QStringLiteral("/bin/sh"), list);
+    p.start(QStringLiteral("/bin/sh"),
+            {QStringLiteral("-c"), script,
+             qEnvironmentVariable("ZV_TEST_BUILD_DIR") + QStringLiteral("/src/app/zorvane-filer")});
     if (!p.waitForFinished(30000)) {
         p.kill();
         return {};
     }
-    Result r;
-    r.status = p.exitStatus() == QProcess::NormalExit ? p.exitCode() : -2;
-    r.err = QString::fromUtf8(p.readAllStandardError());
-    return r;
+    return {p.exitStatus() == QProcess::NormalExit ? p.exitCode() : -2,
+            QString::fromUtf8(p.readAllStandardError())};
 }
 
 }  // namespace
