@@ -17,10 +17,11 @@
 #include "util/errors.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
-const QString kInvalidText = QStringLiteral("קליטה של ערך לא חוקי לתאריך : ");
+const QString kInvalidText = u"קליטה של ערך לא חוקי לתאריך : "_s;
 const QString kRangeText = QStringLiteral(
     "קליטה של ערך לא מחוץ לטווח תאריכים 01-01-1900 >-< 31-12-2099 \r\n"
     "נעשה נסיון לקלוט תאריך : ");
@@ -104,7 +105,7 @@ void TestGDate::emptyReadsZero_data() {
     QTest::newRow("empty text") << QVariant(QString());
     QTest::newRow("null") << QVariant(QMetaType(QMetaType::QDate));
     QTest::newRow("never set") << QVariant();
-    QTest::newRow("not a number") << QVariant(QStringLiteral("abc"));
+    QTest::newRow("not a number") << QVariant(u"abc"_s);
 }
 
 void TestGDate::emptyReadsZero() {
@@ -116,7 +117,7 @@ void TestGDate::emptyReadsZero() {
     QCOMPARE(g.Value().toInt(), 0);
     QCOMPARE(g.Text(), QString());
     QVERIFY(g.date().isNull());
-    QCOMPARE(EditOf(g).displayText(), QStringLiteral("__-__-____"));
+    QCOMPARE(EditOf(g).displayText(), u"__-__-____"_s);
 }
 
 void TestGDate::valueAssignments_data() {
@@ -125,8 +126,8 @@ void TestGDate::valueAssignments_data() {
     QTest::newRow("date") << QVariant(QDate(2026, 12, 5)) << QDate(2026, 12, 5);
     QTest::newRow("date and time")
         << QVariant(QDateTime(QDate(2001, 2, 3), QTime(23, 59))) << QDate(2001, 2, 3);
-    QTest::newRow("text in format") << QVariant(QStringLiteral("05-12-2026")) << QDate(2026, 12, 5);
-    QTest::newRow("iso text") << QVariant(QStringLiteral("2026-12-05")) << QDate(2026, 12, 5);
+    QTest::newRow("text in format") << QVariant(u"05-12-2026"_s) << QDate(2026, 12, 5);
+    QTest::newRow("iso text") << QVariant(u"2026-12-05"_s) << QDate(2026, 12, 5);
     QTest::newRow("day number") << QVariant(45000) << QDate(2023, 3, 15);
     QTest::newRow("first day") << QVariant(QDate(1900, 1, 1)) << QDate(1900, 1, 1);
     QTest::newRow("last day") << QVariant(QDate(2099, 12, 31)) << QDate(2099, 12, 31);
@@ -140,16 +141,16 @@ void TestGDate::valueAssignments() {
     g.SetValue(assigned);
     QCOMPARE(g.Value(), QVariant(expected));
     QCOMPARE(g.date(), expected);
-    QCOMPARE(g.Text(), expected.toString(QStringLiteral("dd-MM-yyyy")));
+    QCOMPARE(g.Text(), expected.toString(u"dd-MM-yyyy"_s));
     QCOMPARE(changed.count(), 1);
-    QCOMPARE(changed.at(0).at(0).toString(), QStringLiteral("Value"));
+    QCOMPARE(changed.at(0).at(0).toString(), u"Value"_s);
 }
 
 void TestGDate::valueOutsideRangeIsRefused_data() {
     QTest::addColumn<QVariant>("assigned");
     QTest::newRow("before 1900") << QVariant(QDate(1899, 12, 31));
     QTest::newRow("after 2099") << QVariant(QDate(2100, 1, 1));
-    QTest::newRow("no date") << QVariant(QStringLiteral("31-02-2020"));
+    QTest::newRow("no date") << QVariant(u"31-02-2020"_s);
 }
 
 void TestGDate::valueOutsideRangeIsRefused() {
@@ -169,24 +170,16 @@ void TestGDate::typedDates_data() {
     QTest::addColumn<QString>("typed");
     QTest::addColumn<QString>("message");  // empty: accepted
     QTest::addColumn<QVariant>("value");
-    QTest::newRow("good") << QStringLiteral("15062021") << QString()
-                          << QVariant(QDate(2021, 6, 15));
+    QTest::newRow("good") << u"15062021"_s << QString() << QVariant(QDate(2021, 6, 15));
     QTest::newRow("separators typed")
-        << QStringLiteral("15-06-2021") << QString() << QVariant(QDate(2021, 6, 15));
-    QTest::newRow("one digit") << QStringLiteral("1") << kInvalidText + QStringLiteral("1_-__-____")
-                               << QVariant(0);
-    QTest::newRow("no such day") << QStringLiteral("31022020")
-                                 << kInvalidText + QStringLiteral("31-02-2020") << QVariant(0);
-    QTest::newRow("month 13") << QStringLiteral("01132020")
-                              << kInvalidText + QStringLiteral("01-13-2020") << QVariant(0);
-    QTest::newRow("incomplete") << QStringLiteral("0101")
-                                << kInvalidText + QStringLiteral("01-01-____") << QVariant(0);
-    QTest::newRow("before range") << QStringLiteral("31121899")
-                                  << kRangeText + QStringLiteral("31-12-1899") << QVariant(0);
-    QTest::newRow("after range") << QStringLiteral("01012100")
-                                 << kRangeText + QStringLiteral("01-01-2100") << QVariant(0);
-    QTest::newRow("first of range")
-        << QStringLiteral("01011900") << QString() << QVariant(QDate(1900, 1, 1));
+        << u"15-06-2021"_s << QString() << QVariant(QDate(2021, 6, 15));
+    QTest::newRow("one digit") << u"1"_s << kInvalidText + u"1_-__-____"_s << QVariant(0);
+    QTest::newRow("no such day") << u"31022020"_s << kInvalidText + u"31-02-2020"_s << QVariant(0);
+    QTest::newRow("month 13") << u"01132020"_s << kInvalidText + u"01-13-2020"_s << QVariant(0);
+    QTest::newRow("incomplete") << u"0101"_s << kInvalidText + u"01-01-____"_s << QVariant(0);
+    QTest::newRow("before range") << u"31121899"_s << kRangeText + u"31-12-1899"_s << QVariant(0);
+    QTest::newRow("after range") << u"01012100"_s << kRangeText + u"01-01-2100"_s << QVariant(0);
+    QTest::newRow("first of range") << u"01011900"_s << QString() << QVariant(QDate(1900, 1, 1));
 }
 
 void TestGDate::typedDates() {
@@ -221,10 +214,10 @@ void TestGDate::typedDates() {
 void TestGDate::restoreDecidesWhatStays_data() {
     QTest::addColumn<bool>("restore");
     QTest::addColumn<QString>("typed");
-    QTest::newRow("restored after range") << true << QStringLiteral("01011850");
-    QTest::newRow("kept after range") << false << QStringLiteral("01011850");
-    QTest::newRow("restored after bad date") << true << QStringLiteral("30022024");
-    QTest::newRow("kept after bad date") << false << QStringLiteral("30022024");
+    QTest::newRow("restored after range") << true << u"01011850"_s;
+    QTest::newRow("kept after range") << false << u"01011850"_s;
+    QTest::newRow("restored after bad date") << true << u"30022024"_s;
+    QTest::newRow("kept after bad date") << false << u"30022024"_s;
 }
 
 void TestGDate::restoreDecidesWhatStays() {
@@ -244,7 +237,7 @@ void TestGDate::restoreDecidesWhatStays() {
     QVERIFY(seen);
     QCOMPARE((*ui_)->Messages().size(), size_t(1));
     const QString shown = typed.left(2) + u'-' + typed.mid(2, 2) + u'-' + typed.mid(4);
-    QCOMPARE(g.Text(), restore ? QStringLiteral("10-01-2024") : shown);
+    QCOMPARE(g.Text(), restore ? u"10-01-2024"_s : shown);
     QCOMPARE(g.Value(), restore ? QVariant(QDate(2024, 1, 10)) : QVariant(0));
     (*ui_)->Clear();
 }
@@ -252,11 +245,10 @@ void TestGDate::restoreDecidesWhatStays() {
 void TestGDate::invalidCharacterRaisesInvalidInput() {
     GDate g;
     QSignalSpy input(&g, &GDate::InvalidInput);
-    Type(g, QStringLiteral("1a"));
-    QTest::sendKeyEvent(QTest::Click, &EditOf(g), Qt::Key_unknown, QStringLiteral("ש"),
-                        Qt::NoModifier);
+    Type(g, u"1a"_s);
+    QTest::sendKeyEvent(QTest::Click, &EditOf(g), Qt::Key_unknown, u"ש"_s, Qt::NoModifier);
     QCOMPARE(input.count(), 2);
-    QCOMPARE(g.Text(), QStringLiteral("1_-__-____"));
+    QCOMPARE(g.Text(), u"1_-__-____"_s);
 }
 
 void TestGDate::keyPressHandlerCancelsOrChanges() {
@@ -267,15 +259,15 @@ void TestGDate::keyPressHandlerCancelsOrChanges() {
         seen += QChar(static_cast<char16_t>(key));
         if (key == '7') {
             key = '8';
-        } else if (!QStringLiteral("0123456789:/.-").contains(QChar(static_cast<char16_t>(key)))) {
+        } else if (!u"0123456789:/.-"_s.contains(QChar(static_cast<char16_t>(key)))) {
             key = 0;
         }
     });
     QSignalSpy input(&g, &GDate::InvalidInput);
-    Type(g, QStringLiteral("0x1y07z2020"));
-    QCOMPARE(seen, QStringLiteral("0x1y07z2020"));
+    Type(g, u"0x1y07z2020"_s);
+    QCOMPARE(seen, u"0x1y07z2020"_s);
     QCOMPARE(input.count(), 0);
-    QCOMPARE(g.Text(), QStringLiteral("01-08-2020"));
+    QCOMPARE(g.Text(), u"01-08-2020"_s);
 }
 
 void TestGDate::keyDownHandlerCancelsKey() {
@@ -295,17 +287,17 @@ void TestGDate::keyDownHandlerCancelsKey() {
 void TestGDate::enterWithGoodDateReachesDefaultButton() {
     QDialog dialog;
     auto* g = new GDate(&dialog);
-    auto* ok = new QPushButton(QStringLiteral("OK"), &dialog);
+    auto* ok = new QPushButton(u"OK"_s, &dialog);
     ok->setDefault(true);
     ok->move(0, 40);
     QSignalSpy clicked(ok, &QPushButton::clicked);
     dialog.show();
-    Type(*g, QStringLiteral("3105"));
+    Type(*g, u"3105"_s);
     PressEnter(*g);
     QCOMPARE(clicked.count(), 0);
     QCOMPARE((*ui_)->Messages().size(), size_t(1));
     (*ui_)->Clear();
-    Type(*g, QStringLiteral("31052025"));
+    Type(*g, u"31052025"_s);
     PressEnter(*g);
     QCOMPARE(clicked.count(), 1);
     QCOMPARE(g->date(), QDate(2025, 5, 31));
@@ -316,7 +308,7 @@ void TestGDate::todayButton() {
     g.resize(120, 20);
     g.show();
     QSignalSpy change(&g, &GDate::Change);
-    QCOMPARE(g.CmdNow().toolTip(), QStringLiteral("הצב תאריך היום"));
+    QCOMPARE(g.CmdNow().toolTip(), u"הצב תאריך היום"_s);
     QTest::mouseClick(&g.CmdNow(), Qt::LeftButton);
     QCOMPARE(g.Value(), QVariant(QDate(2026, 3, 14)));
     QVERIFY(!g.CmdNow().isChecked());
@@ -361,7 +353,7 @@ void TestGDate::lockedVersusEnabled() {
     QVERIFY(g.Locked());
     QVERIFY(!g.CmdNow().isEnabled());
     QVERIFY(g.Enabled());
-    Type(g, QStringLiteral("11"));
+    Type(g, u"11"_s);
     QCOMPARE(g.date(), QDate(2022, 2, 2));
 
     g.SetEnabled(false);
@@ -376,8 +368,8 @@ void TestGDate::lockedVersusEnabled() {
 
     g.SetLocked(false);
     QVERIFY(g.CmdNow().isEnabled());
-    Type(g, QStringLiteral("11"));
-    QCOMPARE(g.Text(), QStringLiteral("11-02-2022"));
+    Type(g, u"11"_s);
+    QCOMPARE(g.Text(), u"11-02-2022"_s);
 }
 
 void TestGDate::nowButtonLayoutTwips_data() {
@@ -446,12 +438,12 @@ void TestGDate::captionFollowsRatio() {
     g.setLayoutDirection(Qt::RightToLeft);
     g.resize(200, 20);  // 3000 twips wide
     // As a Designer form sets them.
-    QVERIFY(g.setProperty("Caption", QStringLiteral("תאריך")));
+    QVERIFY(g.setProperty("Caption", u"תאריך"_s));
     QVERIFY(g.setProperty("Ratio", 30));
     g.show();
     QLabel& caption = g.TDBDate1().CaptionLabel();
     QVERIFY(caption.isVisible());
-    QCOMPARE(caption.text(), QStringLiteral("תאריך"));
+    QCOMPARE(caption.text(), u"תאריך"_s);
     QCOMPARE(caption.width(), 60);
     // Right to left, the caption sits at the right edge and the editor beside it.
     QCOMPARE(caption.geometry().right(), 199);
@@ -487,7 +479,7 @@ void TestGDate::selectOnEntry() {
     if (dontSelData) {
         QVERIFY(!edit.hasSelectedText());
     } else {
-        QCOMPARE(edit.selectedText(), QStringLiteral("08-07-2023"));
+        QCOMPARE(edit.selectedText(), u"08-07-2023"_s);
     }
 }
 
@@ -518,9 +510,9 @@ void TestGDate::mouseRelayInTwips() {
 void TestGDate::childrenGetFixedFont() {
     GDate g;
     g.show();
-    QCOMPARE(g.TDBDate1().font().family(), QStringLiteral("MS Sans Serif"));
+    QCOMPARE(g.TDBDate1().font().family(), u"MS Sans Serif"_s);
     QCOMPARE(g.TDBDate1().font().pointSize(), 8);
-    QCOMPARE(g.CmdNow().font().family(), QStringLiteral("MS Sans Serif"));
+    QCOMPARE(g.CmdNow().font().family(), u"MS Sans Serif"_s);
 }
 
 QTEST_MAIN(TestGDate)

@@ -20,14 +20,15 @@
 #include "watchdog.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
-const QString kOffice = QStringLiteral("100");
-const QString kDana = QStringLiteral("דנה כהן");
-const QString kYossi = QStringLiteral("יוסי לוי");
-const QString kMichal = QStringLiteral("מיכל ברק");
-const QString kRon = QStringLiteral("עו\"ד רון שמיר");
+const QString kOffice = u"100"_s;
+const QString kDana = u"דנה כהן"_s;
+const QString kYossi = u"יוסי לוי"_s;
+const QString kMichal = u"מיכל ברק"_s;
+const QString kRon = u"עו\"ד רון שמיר"_s;
 
 enum How { kButton, kEnter, kCloseBox, kEscape, kOther };
 
@@ -105,16 +106,16 @@ void TestDialogs::cleanup() {
 }
 
 void TestDialogs::AddUsers() {
-    const QString connection = QStringLiteral("test-users");
+    const QString connection = u"test-users"_s;
     {
-        QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), connection);
-        db.setDatabaseName(env_->DataDir() + QStringLiteral("/PUB.MDB"));
+        QSqlDatabase db = QSqlDatabase::addDatabase(u"QSQLITE"_s, connection);
+        db.setDatabaseName(env_->DataDir() + u"/PUB.MDB"_s);
         QVERIFY(db.open());
         const QList<std::pair<QString, QVariant>> users = {
-            {QStringLiteral("5"), kYossi},
-            {QStringLiteral("7"), QStringLiteral("  שרה  ")},
-            {QStringLiteral("8"), QVariant(QMetaType(QMetaType::QString))},
-            {QStringLiteral("11"), QStringLiteral("Admin")}};
+            {u"5"_s, kYossi},
+            {u"7"_s, u"  שרה  "_s},
+            {u"8"_s, QVariant(QMetaType(QMetaType::QString))},
+            {u"11"_s, u"Admin"_s}};
         for (const auto& [stNumber, name] : users) {
             QSqlQuery q(db);
             q.prepare(QStringLiteral(
@@ -132,13 +133,11 @@ void TestDialogs::passwordAnswers_data() {
     QTest::addColumn<int>("how");
     QTest::addColumn<QString>("passChar");
     QTest::addColumn<QString>("shown");
-    QTest::newRow("button, unmasked") << int(kButton) << QString() << QStringLiteral("ab12");
-    QTest::newRow("Enter in the text box")
-        << int(kEnter) << QStringLiteral("*") << QStringLiteral("****");
-    QTest::newRow("Enter on the window")
-        << int(kOther) << QStringLiteral("#") << QStringLiteral("####");
-    QTest::newRow("close box") << int(kCloseBox) << QStringLiteral("*") << QStringLiteral("****");
-    QTest::newRow("Escape") << int(kEscape) << QStringLiteral("*") << QStringLiteral("****");
+    QTest::newRow("button, unmasked") << int(kButton) << QString() << u"ab12"_s;
+    QTest::newRow("Enter in the text box") << int(kEnter) << u"*"_s << u"****"_s;
+    QTest::newRow("Enter on the window") << int(kOther) << u"#"_s << u"####"_s;
+    QTest::newRow("close box") << int(kCloseBox) << u"*"_s << u"****"_s;
+    QTest::newRow("Escape") << int(kEscape) << u"*"_s << u"****"_s;
 }
 
 void TestDialogs::passwordAnswers() {
@@ -150,7 +149,7 @@ void TestDialogs::passwordAnswers() {
     QString displayed;
     (*ui_)->QueueModal([&](QWidget& w) {
         FrmGetPassword& f = As<FrmGetPassword>(w);
-        for (const QChar ch : QStringLiteral("ab12")) {
+        for (const QChar ch : u"ab12"_s) {
             QTest::sendKeyEvent(QTest::Click, &f.Text1(), Qt::Key_unknown, QString(ch),
                                 Qt::NoModifier);
         }
@@ -165,7 +164,7 @@ void TestDialogs::passwordAnswers() {
     QCOMPARE(displayed, shown);
     QCOMPARE(frm.IsCancel(), how == kCloseBox || how == kEscape);
     QVERIFY(!frm.isVisible());
-    QCOMPARE(frm.Text1().text(), QStringLiteral("ab12"));
+    QCOMPARE(frm.Text1().text(), u"ab12"_s);
 }
 
 void TestDialogs::longPromptPushesDown() {
@@ -194,18 +193,14 @@ void TestDialogs::saveAsAnswers_data() {
     QTest::addColumn<QString>("name");
     QTest::addColumn<int>("how");
     QTest::newRow("dots in the name, save button")
-        << QStringLiteral("C:\\A\\B\\report.final.docx") << QStringLiteral("C:\\A\\B\\")
-        << QStringLiteral("report.final") << int(kButton);
+        << u"C:\\A\\B\\report.final.docx"_s << u"C:\\A\\B\\"_s << u"report.final"_s << int(kButton);
     QTest::newRow("hebrew, forward separators, Enter")
-        << QStringLiteral("/srv/zorvane/DOCS/100/מכתב ללקוח.msg")
-        << QStringLiteral("/srv/zorvane/DOCS/100/") << QStringLiteral("מכתב ללקוח") << int(kEnter);
+        << u"/srv/zorvane/DOCS/100/מכתב ללקוח.msg"_s << u"/srv/zorvane/DOCS/100/"_s
+        << u"מכתב ללקוח"_s << int(kEnter);
     QTest::newRow("dot in a folder only, cancel button")
-        << QStringLiteral("C:\\v1.2\\readme.txt") << QStringLiteral("C:\\v1.2\\")
-        << QStringLiteral("readme") << int(kOther);
-    QTest::newRow("close box") << QStringLiteral("C:\\a.msg") << QStringLiteral("C:\\")
-                               << QStringLiteral("a") << int(kCloseBox);
-    QTest::newRow("Escape") << QStringLiteral("C:\\a.msg") << QStringLiteral("C:\\")
-                            << QStringLiteral("a") << int(kEscape);
+        << u"C:\\v1.2\\readme.txt"_s << u"C:\\v1.2\\"_s << u"readme"_s << int(kOther);
+    QTest::newRow("close box") << u"C:\\a.msg"_s << u"C:\\"_s << u"a"_s << int(kCloseBox);
+    QTest::newRow("Escape") << u"C:\\a.msg"_s << u"C:\\"_s << u"a"_s << int(kEscape);
 }
 
 void TestDialogs::saveAsAnswers() {
@@ -234,15 +229,14 @@ void TestDialogs::extensionLists_data() {
     QTest::addColumn<int>("sug");
     QTest::addColumn<QString>("sourceExt");
     QTest::addColumn<QStringList>("items");
-    const QStringList word = {QStringLiteral("Doc"), QStringLiteral("Docx")};
-    const QStringList mail = {QStringLiteral("msg"), QStringLiteral("eml"), QStringLiteral("htm")};
+    const QStringList word = {u"Doc"_s, u"Docx"_s};
+    const QStringList mail = {u"msg"_s, u"eml"_s, u"htm"_s};
     // A Word source is offered the first of the list, not its own extension.
-    QTest::newRow("document from docx") << 2 << QStringLiteral("docx") << word;
+    QTest::newRow("document from docx") << 2 << u"docx"_s << word;
     // Other types keep their own extension first instead of being renamed to .Doc.
-    QTest::newRow("document from PDF")
-        << 2 << QStringLiteral("PDF") << (QStringList{QStringLiteral("PDF")} + word);
-    QTest::newRow("mail item from eml") << 1 << QStringLiteral("eml") << mail;
-    QTest::newRow("mail kind ignores a pdf source") << 0 << QStringLiteral("pdf") << mail;
+    QTest::newRow("document from PDF") << 2 << u"PDF"_s << (QStringList{u"PDF"_s} + word);
+    QTest::newRow("mail item from eml") << 1 << u"eml"_s << mail;
+    QTest::newRow("mail kind ignores a pdf source") << 0 << u"pdf"_s << mail;
 }
 
 void TestDialogs::extensionLists() {
@@ -251,7 +245,7 @@ void TestDialogs::extensionLists() {
     QFETCH(QStringList, items);
     SetSourceExt(sourceExt);
     FrmSaveAs frm;
-    frm.SetFileName(QStringLiteral("C:\\DOCS\\a.") + sourceExt);
+    frm.SetFileName(u"C:\\DOCS\\a."_s + sourceExt);
     frm.SetSug(static_cast<int16_t>(sug));
     QStringList shown;
     (*ui_)->QueueModal([&](QWidget& w) {
@@ -275,10 +269,10 @@ void TestDialogs::startSelection_data() {
     QTest::newRow("two users, the first of a repeated name")
         << kRon + u';' + kYossi << false << QList<int>{1, 6} << kYossi + u';' + kRon;
     QTest::newRow("unknown name ignored")
-        << QStringLiteral("אין כזה;") + kMichal << false << QList<int>{2} << kMichal;
-    QTest::newRow("case matters") << QStringLiteral("admin") << false << QList<int>{} << QString();
+        << u"אין כזה;"_s + kMichal << false << QList<int>{2} << kMichal;
+    QTest::newRow("case matters") << u"admin"_s << false << QList<int>{} << QString();
     QTest::newRow("blanks matter")
-        << QStringLiteral(" דנה כהן;") + kRon + u' ' << false << QList<int>{} << QString();
+        << u" דנה כהן;"_s + kRon + u' ' << false << QList<int>{} << QString();
     QTest::newRow("all users entry")
         << FrmGetUsers::AllUsersText() + u';' + kDana << true << QList<int>{0, 1}
         << FrmGetUsers::AllUsersText() + u';' + kDana;
@@ -309,14 +303,7 @@ void TestDialogs::startSelection() {
     });
     ShowModal(frm);
     // "10" after "8": numeric order, not text order; the other office's user is left out.
-    QStringList texts{kDana,
-                      kYossi,
-                      kMichal,
-                      kYossi,
-                      QStringLiteral("שרה"),
-                      QString(),
-                      kRon,
-                      QStringLiteral("Admin")};
+    QStringList texts{kDana, kYossi, kMichal, kYossi, u"שרה"_s, QString(), kRon, u"Admin"_s};
     QList<int> expectedNumbers{1, 2, 3, 5, 7, 8, 10, 11};
     if (withAllUsers) {
         texts.prepend(FrmGetUsers::AllUsersText());
@@ -364,7 +351,7 @@ void TestDialogs::usersAnswers() {
 }
 
 void TestDialogs::missingDatabaseIsReported() {
-    QVERIFY(QFile::remove(env_->DataDir() + QStringLiteral("/PUB.MDB")));
+    QVERIFY(QFile::remove(env_->DataDir() + u"/PUB.MDB"_s));
     FrmGetUsers frm;
     frm.SetWithAllUsers(true);
     frm.SetStartUsers(FrmGetUsers::AllUsersText());
@@ -372,8 +359,7 @@ void TestDialogs::missingDatabaseIsReported() {
     ShowModal(frm);
     QCOMPARE((*ui_)->Messages().size(), size_t(1));
     const auto& m = (*ui_)->Messages().front();
-    QVERIFY2(m.text.startsWith(QStringLiteral("3024-0-initCbo-Could not find file")),
-             qPrintable(m.text));
+    QVERIFY2(m.text.startsWith(u"3024-0-initCbo-Could not find file"_s), qPrintable(m.text));
     QCOMPARE(m.style, int(vbOKOnly));
     // The list keeps what was added before the failure, and the selection still applies.
     QCOMPARE(Texts(frm.List1()), QStringList{FrmGetUsers::AllUsersText()});

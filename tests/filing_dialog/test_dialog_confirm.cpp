@@ -37,7 +37,7 @@ class RecordingKeyboard : public KeyboardPlatform {
     void LoadLayout(const QString& layoutId) override { active_ = layoutId; }
 
   private:
-    QString active_ = QStringLiteral("00000409");
+    QString active_ = u"00000409"_s;
 };
 
 }  // namespace
@@ -60,8 +60,7 @@ class TestDialogConfirm : public QObject {
         });
         d.show();
         f.Child<QPushButton>("CmdOK").click();
-        QCOMPARE(f.Ui().Texts(),
-                 QStringList{QStringLiteral("חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך")});
+        QCOMPARE(f.Ui().Texts(), QStringList{u"חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך"_s});
         QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
         QVERIFY(d.isVisible());
     }
@@ -72,10 +71,10 @@ class TestDialogConfirm : public QObject {
             d.SetDefultName({});
             d.SetIsCaptureMail(true);
         });
-        f.Child<QLabel>("LakNum").setText(QStringLiteral("1001"));
+        f.Child<QLabel>("LakNum").setText(u"1001"_s);
         d.show();
         f.Child<QPushButton>("CmdOK").click();
-        QCOMPARE(f.Ui().Texts(), QStringList{QStringLiteral("יש לקבוע שם לקובץ הנשמר")});
+        QCOMPARE(f.Ui().Texts(), QStringList{u"יש לקבוע שם לקובץ הנשמר"_s});
         QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
         QVERIFY(d.isVisible());
     }
@@ -98,19 +97,19 @@ class TestDialogConfirm : public QObject {
         QFETCH(bool, confirmed);
         DialogFixture f;
         FrmGetDocDet& d = f.Load();
-        f.Child<QLabel>("LakNum").setText(QStringLiteral("1001"));
-        f.Child<QComboBox>("CboTeur").setEditText(QStringLiteral("תיאור חופשי"));
+        f.Child<QLabel>("LakNum").setText(u"1001"_s);
+        f.Child<QComboBox>("CboTeur").setEditText(u"תיאור חופשי"_s);
         const QString target = d.FileNameToSave();
         if (!existing.isEmpty()) {
-            QFile file(f.Docs() + QStringLiteral("/MAILIN/") + existing);
+            QFile file(f.Docs() + u"/MAILIN/"_s + existing);
             QVERIFY(file.open(QIODevice::WriteOnly));
         }
         d.show();
         f.Ui().QueueAnswer(answer);
         f.Child<QPushButton>("CmdOK").click();
         if (asked) {
-            QCOMPARE(f.Ui().Texts(), QStringList{QStringLiteral("קיים קובץ בשם זה האם לשכתבו : ") +
-                                                 QStringLiteral("\r\n") + target});
+            QCOMPARE(f.Ui().Texts(),
+                     QStringList{u"קיים קובץ בשם זה האם לשכתבו : "_s + u"\r\n"_s + target});
             QCOMPARE(f.Ui().Messages().front().style, int(vbQuestion | vbYesNo | vbDefaultButton2));
         } else {
             QCOMPARE(f.Ui().Texts(), QStringList());
@@ -118,19 +117,19 @@ class TestDialogConfirm : public QObject {
         QCOMPARE(d.isVisible(), !confirmed);
         QVERIFY(!d.IsCancel());
         QCOMPARE(d.FileNameToSave(), target);
-        QCOMPARE(d.Details().description, QStringLiteral("תיאור חופשי"));
+        QCOMPARE(d.Details().description, u"תיאור חופשי"_s);
     }
 
     void details() {
         DialogFixture f;
         FrmGetDocDet& d = f.Load([](FrmGetDocDet& d) { d.SetPartOf(5); });
-        f.Child<QLabel>("LakNum").setText(QStringLiteral("5"));
-        f.Child<QLabel>("LblSug").setText(QStringLiteral("H"));
-        f.Child<QLabel>("LSugTik").setText(QStringLiteral("4"));
-        f.Child<QLabel>("LTik").setText(QStringLiteral("9"));
-        f.Child<QLabel>("LTikNum").setText(QStringLiteral("9-1"));
+        f.Child<QLabel>("LakNum").setText(u"5"_s);
+        f.Child<QLabel>("LblSug").setText(u"H"_s);
+        f.Child<QLabel>("LSugTik").setText(u"4"_s);
+        f.Child<QLabel>("LTik").setText(u"9"_s);
+        f.Child<QLabel>("LTikNum").setText(u"9-1"_s);
         f.Child<QComboBox>("CboSecTeur").setCurrentIndex(1);
-        f.Child<QLineEdit>("TxtRemark").setText(QStringLiteral("הערה"));
+        f.Child<QLineEdit>("TxtRemark").setText(u"הערה"_s);
         f.Child<QCheckBox>("ChkIsMemo").click();
         f.Child<QCheckBox>("ChkIsJumpMemo").click();
         f.Child<GDate>("TDateMemo").SetValue(QDate(2026, 4, 1));
@@ -138,23 +137,23 @@ class TestDialogConfirm : public QObject {
         f.Child<QPushButton>("CmdOK").click();
         QVERIFY(!d.isVisible());
         const DocDetails v = d.Details();
-        QCOMPARE(v.handlers, QStringLiteral("דנה כהן"));
-        QCOMPARE(v.moreDescription, QStringLiteral("העתק"));
-        QCOMPARE(v.remark, QStringLiteral("הערה"));
+        QCOMPARE(v.handlers, u"דנה כהן"_s);
+        QCOMPARE(v.moreDescription, u"העתק"_s);
+        QCOMPARE(v.remark, u"הערה"_s);
         QVERIFY(v.reminder);
         QVERIFY(v.popup);
         QCOMPARE(v.reminderDate, QDate(2026, 4, 1));
-        QCOMPARE(v.reminderTime, QStringLiteral("08:00"));
+        QCOMPARE(v.reminderTime, u"08:00"_s);
         QCOMPARE(v.receivedDate, QDate(2026, 3, 17));
         QCOMPARE(v.createdDate, QDate(2026, 3, 17));
         QVERIFY(!v.createdUnlocked);
         QCOMPARE(v.origin, std::optional<int>(5));
         QCOMPARE(v.status, std::optional<int>(2));
-        QCOMPARE(v.clientNumber, QStringLiteral("5"));
-        QCOMPARE(v.kindLetter, QStringLiteral("H"));
-        QCOMPARE(v.subKind, QStringLiteral("4"));
-        QCOMPARE(v.caseNumber, QStringLiteral("9"));
-        QCOMPARE(v.caseCode, QStringLiteral("9-1"));
+        QCOMPARE(v.clientNumber, u"5"_s);
+        QCOMPARE(v.kindLetter, u"H"_s);
+        QCOMPARE(v.subKind, u"4"_s);
+        QCOMPARE(v.caseNumber, u"9"_s);
+        QCOMPARE(v.caseCode, u"9-1"_s);
     }
 
     void unlockCreationDate_data() {
@@ -177,7 +176,7 @@ class TestDialogConfirm : public QObject {
             prompt = p.Label1().text();
             QCOMPARE(p.Text1().echoMode(), QLineEdit::Password);
             if (code == QLatin1String("-")) {
-                p.Text1().setText(QStringLiteral("5382"));
+                p.Text1().setText(u"5382"_s);
                 p.close();
             } else {
                 p.Text1().setText(code);
@@ -185,12 +184,11 @@ class TestDialogConfirm : public QObject {
             }
         });
         f.Child<QPushButton>("Command3").click();
-        QCOMPARE(prompt, QStringLiteral("קלוט סיסמא לשינוי תאריך היצירה"));
+        QCOMPARE(prompt, u"קלוט סיסמא לשינוי תאריך היצירה"_s);
         QCOMPARE(f.Child<GDate>("TDate").Enabled(), unlocked);
         QCOMPARE(d.Details().createdUnlocked, unlocked);
         if (unlocked) {
-            QCOMPARE(f.Ui().Texts(),
-                     QStringList{QStringLiteral("ניתן כעת לערוך את תאריך יצירה ולשמור")});
+            QCOMPARE(f.Ui().Texts(), QStringList{u"ניתן כעת לערוך את תאריך יצירה ולשמור"_s});
             QCOMPARE(f.Ui().Messages().front().style, int(vbExclamation));
         } else {
             QCOMPARE(f.Ui().Texts(), QStringList());
@@ -217,7 +215,7 @@ class TestDialogConfirm : public QObject {
             auto& picker = dynamic_cast<FrmGetUsers&>(w);
             start = picker.StartUsers();
             all = picker.WithAllUsers();
-            if (pick == QStringList{QStringLiteral("-")}) {
+            if (pick == QStringList{u"-"_s}) {
                 picker.close();
                 return;
             }
@@ -228,7 +226,7 @@ class TestDialogConfirm : public QObject {
             picker.Command1().click();
         });
         f.Child<QPushButton>("CmdListOpen").click();
-        QCOMPARE(start, QStringLiteral("משה לוי"));
+        QCOMPARE(start, u"משה לוי"_s);
         QVERIFY(all);
         QCOMPARE(f.Child<QLabel>("LPersonal").text(), shown);
         QCOMPARE(d.Details().handlers, shown);
@@ -239,7 +237,7 @@ class TestDialogConfirm : public QObject {
         f.Load();
         auto& now = f.Child<QPushButton>("CmdNow");
         now.click();
-        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), QStringLiteral("14:05"));
+        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), u"14:05"_s);
         QVERIFY(!now.isChecked());
 
         auto& memo = f.Child<QCheckBox>("ChkIsMemo");
@@ -344,13 +342,13 @@ class TestDialogConfirm : public QObject {
         QCOMPARE(name.text(), before);
         QCOMPARE(f.Ui().Texts(), QStringList{ForbiddenNameMessage()});
         QCOMPARE(ForbiddenNameMessage(),
-                 QStringLiteral("אסור לקלוט כחלק משם קובץ את התווים הבאים : /\\:*?\"<>|"));
+                 u"אסור לקלוט כחלק משם קובץ את התווים הבאים : /\\:*?\"<>|"_s);
         QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
         QCOMPARE(d.FileNameToSave(), target);
         // Allowed text still goes in the same way.
         f.Ui().Clear();
         if (how == QLatin1String("paste")) {
-            QApplication::clipboard()->setText(QStringLiteral("-2"));
+            QApplication::clipboard()->setText(u"-2"_s);
             QTest::keyClick(&name, Qt::Key_V, Qt::ControlModifier);
         } else {
             name.end(false);
@@ -394,8 +392,7 @@ class TestDialogConfirm : public QObject {
         QCOMPARE(QApplication::focusWidget(), &f.Child<QWidget>("CmdLak"));
         f.Child<QLineEdit>("TxtRemark").setFocus();
         QTest::keyClick(&f.Child<QLineEdit>("TxtRemark"), Qt::Key_Return);
-        QCOMPARE(f.Ui().Texts(),
-                 QStringList{QStringLiteral("חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך")});
+        QCOMPARE(f.Ui().Texts(), QStringList{u"חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך"_s});
         // Each control of the tab chain follows the one before it in reading order: further
         // left on the same line, or on a lower line; the chain starts again at the top of the
         // folder column, left of the properties.
@@ -437,7 +434,7 @@ class TestDialogConfirm : public QObject {
              {"TxtTeur", "CboStatus", "TDateRecieved", "TDBTime1", "FolderView1", "CmdOK"}) {
             QVERIFY2(chain.contains(QLatin1String(name)), name);
         }
-        QCOMPARE(chain.last(), QStringLiteral("CmdOK"));
+        QCOMPARE(chain.last(), u"CmdOK"_s);
     }
 };
 

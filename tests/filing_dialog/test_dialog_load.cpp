@@ -39,26 +39,25 @@ QList<int> Data(const QComboBox& box) {
 
 // Code tables of known content, written out of order and with blanks around the texts.
 void SetCodeRows(DialogFixture& f) {
-    f.Exec(QStringLiteral("OFFICE"), QStringLiteral("DELETE FROM OFF_CODE"));
-    f.Exec(QStringLiteral("OFFICE"),
+    f.Exec(u"OFFICE"_s, u"DELETE FROM OFF_CODE"_s);
+    f.Exec(u"OFFICE"_s,
            QStringLiteral("INSERT INTO OFF_CODE (CODE, NUM, Teur) VALUES (20, 2, ' חוזה '), "
                           "(20, 1, 'מכתב'), (20, 10, 'פסק דין'), (21, 1, 'מקור'), "
                           "(21, 2, 'העתק'), (5, 1, 'סניף')"));
-    f.Exec(QStringLiteral("OFFICE"), QStringLiteral("DELETE FROM MTIK"));
+    f.Exec(u"OFFICE"_s, u"DELETE FROM MTIK"_s);
     f.Exec(
-        QStringLiteral("OFFICE"),
+        u"OFFICE"_s,
         QStringLiteral("INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (28, '  תיקי הוצאה לפועל  ', 1), "
                        "(26, 'תיקי ירושה', 1), (29, 'תיקי ארכיון', 0)"));
-    f.Exec(QStringLiteral("MDOCS"), QStringLiteral("DELETE FROM DOCSTATUS"));
-    f.Exec(QStringLiteral("MDOCS"),
+    f.Exec(u"MDOCS"_s, u"DELETE FROM DOCSTATUS"_s);
+    f.Exec(u"MDOCS"_s,
            QStringLiteral("INSERT INTO DOCSTATUS (ID, Caption, ORD) VALUES (3, 'סגור', 4), "
                           "(1, 'חדש', 1), (4, ' ממתין לתגובה ', 3), (2, 'בטיפול', 2)"));
-    f.Exec(QStringLiteral("MADAD"), QStringLiteral("DELETE FROM TRANS_CODE"));
-    f.Exec(QStringLiteral("MADAD"),
-           QStringLiteral("INSERT INTO TRANS_CODE (TABLE_NUM, KOD_NUM_1, Teur) VALUES "
-                          "('1080', '10', 'אחר'), ('1080', '9', 'הוצאה לפועל'), "
-                          "('1080', '5', ' סריקה '), ('1080', '1', 'דואר'), "
-                          "('1070', '2', 'טבלה אחרת')"));
+    f.Exec(u"MADAD"_s, u"DELETE FROM TRANS_CODE"_s);
+    f.Exec(u"MADAD"_s, QStringLiteral("INSERT INTO TRANS_CODE (TABLE_NUM, KOD_NUM_1, Teur) VALUES "
+                                      "('1080', '10', 'אחר'), ('1080', '9', 'הוצאה לפועל'), "
+                                      "('1080', '5', ' סריקה '), ('1080', '1', 'דואר'), "
+                                      "('1070', '2', 'טבלה אחרת')"));
 }
 
 }  // namespace
@@ -82,7 +81,7 @@ class TestDialogLoad : public QObject {
                  QStringList({"1 - חדש", "2 - בטיפול", "4 - ממתין לתגובה", "3 - סגור"}));
         QCOMPARE(Data(status), QList<int>({1, 2, 4, 3}));
         QCOMPARE(d.Status(), int16_t(2));
-        QCOMPARE(status.currentText(), QStringLiteral("2 - בטיפול"));
+        QCOMPARE(status.currentText(), u"2 - בטיפול"_s);
 
         auto& origin = f.Child<QComboBox>("CboPartOf");
         QCOMPARE(Texts(origin),
@@ -101,30 +100,30 @@ class TestDialogLoad : public QObject {
         QCOMPARE(f.Child<GDate>("TDateMemo").date(), QDate(2026, 3, 17));
         QCOMPARE(f.Child<GDate>("TDateRecieved").date(), QDate(2026, 3, 17));
         QVERIFY(!f.Child<GDate>("TDate").Enabled());
-        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), QStringLiteral("08:00"));
-        QCOMPARE(f.Child<QLabel>("LPersonal").text(), QStringLiteral("דנה כהן"));
-        QCOMPARE(f.Child<QLabel>("LGlobalNum").text(), QStringLiteral("23/100/1"));
-        QCOMPARE(UserCode(), QStringLiteral("100"));
+        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), u"08:00"_s);
+        QCOMPARE(f.Child<QLabel>("LPersonal").text(), u"דנה כהן"_s);
+        QCOMPARE(f.Child<QLabel>("LGlobalNum").text(), u"23/100/1"_s);
+        QCOMPARE(UserCode(), u"100"_s);
 
         auto& name = f.Child<QLineEdit>("TxtTeur");
-        QCOMPARE(name.text(), QStringLiteral("מכתב ללקוח"));
+        QCOMPARE(name.text(), u"מכתב ללקוח"_s);
         QCOMPARE(name.selectedText(), name.text());
 
-        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN");
+        const QString mailIn = f.Docs() + u"/MAILIN"_s;
         auto& tree = f.Child<FolderView>("FolderView1");
         QVERIFY(tree.isHidden());
         QCOMPARE(tree.SelectedPath(), mailIn);
         QCOMPARE(f.Child<QLabel>("LDir").text(), mailIn);
         QCOMPARE(d.StartDir(), mailIn);
         QCOMPARE(d.DirToSave(), mailIn + QLatin1Char('/'));
-        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(d.FileNameToSave(), mailIn + u"/מכתב ללקוח"_s);
         QCOMPARE(f.Child<QLabel>("LFileName").text(), d.FileNameToSave());
         QVERIFY(!d.IsCancel());
 
         QCOMPARE(OptKeyNames().size(), 20);
-        QCOMPARE(OptKeyNames().value(QStringLiteral("1026")), QStringLiteral("תיקי ירושה"));
-        QCOMPARE(OptKeyNames().value(QStringLiteral("1028")), QStringLiteral("תיקי הוצאה לפועל"));
-        QVERIFY(!OptKeyNames().contains(QStringLiteral("1029")));
+        QCOMPARE(OptKeyNames().value(u"1026"_s), u"תיקי ירושה"_s);
+        QCOMPARE(OptKeyNames().value(u"1028"_s), u"תיקי הוצאה לפועל"_s);
+        QVERIFY(!OptKeyNames().contains(u"1029"_s));
         QVERIFY(!f.Child<QLabel>("LblSug").isVisibleTo(&d));
     }
 
@@ -174,7 +173,7 @@ class TestDialogLoad : public QObject {
         QFETCH(QString, change);
         QFETCH(int, messages);
         DialogFixture f;
-        f.Exec(QStringLiteral("OFFICE"), change);
+        f.Exec(u"OFFICE"_s, change);
         f.Load();
         QStringList keys = OptKeyNames().keys();
         std::sort(keys.begin(), keys.end(),
@@ -182,34 +181,34 @@ class TestDialogLoad : public QObject {
         QCOMPARE(keys, QStringList({"0", "1", "2", "3", "4", "5", "7", "8", "9", "10", "11", "12",
                                     "13", "14", "15", "16", "17", "18"}));
         QCOMPARE(OptKeyNames().value("13"), OptKeyNames().value("5"));
-        QCOMPARE(OptKeyNames().value("18"), QStringLiteral("מומחים"));
+        QCOMPARE(OptKeyNames().value("18"), u"מומחים"_s);
         QCOMPARE(f.Ui().Messages().size(), size_t(messages));
         if (messages) {
-            QVERIFY(f.Ui().Texts().front().contains(QStringLiteral("-0-SetOptKeyLakTik-")));
+            QVERIFY(f.Ui().Texts().front().contains(u"-0-SetOptKeyLakTik-"_s));
         }
     }
 
     void userKindAddedUnderItsKey() {
         DialogFixture f;
-        f.Exec(QStringLiteral("OFFICE"), "INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (3, NULL, 1)");
+        f.Exec(u"OFFICE"_s, "INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (3, NULL, 1)");
         f.Load();
-        QVERIFY(OptKeyNames().contains(QStringLiteral("1003")));
-        QCOMPARE(OptKeyNames().value(QStringLiteral("1003")), QString());
+        QVERIFY(OptKeyNames().contains(u"1003"_s));
+        QCOMPARE(OptKeyNames().value(u"1003"_s), QString());
     }
 
     void failingListStopsTheRest() {
         DialogFixture f;
         SetCodeRows(f);
-        f.Exec(QStringLiteral("MDOCS"), "DROP TABLE DOCSTATUS");
+        f.Exec(u"MDOCS"_s, "DROP TABLE DOCSTATUS");
         f.Load();
         QCOMPARE(f.Ui().Messages().size(), size_t(1));
-        QVERIFY(f.Ui().Texts().front().contains(QStringLiteral("-0-InitCbo10-")));
+        QVERIFY(f.Ui().Texts().front().contains(u"-0-InitCbo10-"_s));
         QCOMPARE(f.Child<QComboBox>("CboSecTeur").count(), 2);
         QCOMPARE(f.Child<QComboBox>("CboStatus").count(), 0);
         QCOMPARE(f.Child<QComboBox>("CboPartOf").count(), 0);
         QCOMPARE(f.Child<QComboBox>("CboDocBasic").count(), 0);
         // The rest of the load still runs.
-        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), QStringLiteral("08:00"));
+        QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), u"08:00"_s);
     }
 
     void startFolder_data() {
@@ -225,18 +224,18 @@ class TestDialogLoad : public QObject {
         QFETCH(QString, start);
         QFETCH(QString, selected);
         DialogFixture f;
-        QDir(f.Docs() + QStringLiteral("/MAILIN")).removeRecursively();
-        QVERIFY(QDir().mkpath(f.Docs() + QStringLiteral("/DOC1001")));
-        QVERIFY(QDir().mkpath(f.Root() + QStringLiteral("/elsewhere")));
+        QDir(f.Docs() + u"/MAILIN"_s).removeRecursively();
+        QVERIFY(QDir().mkpath(f.Docs() + u"/DOC1001"_s));
+        QVERIFY(QDir().mkpath(f.Root() + u"/elsewhere"_s));
         const QString startDir = start.isEmpty() ? QString()
                                  : start == QLatin1String("-")
-                                     ? f.Root() + QStringLiteral("/elsewhere")
+                                     ? f.Root() + u"/elsewhere"_s
                                      : f.DataDir() + QLatin1Char('/') + start;
         FrmGetDocDet& d = f.Load([&](FrmGetDocDet& d) { d.SetStartDir(startDir); });
-        QVERIFY(QFileInfo(f.Docs() + QStringLiteral("/MAILIN")).isDir());
+        QVERIFY(QFileInfo(f.Docs() + u"/MAILIN"_s).isDir());
         const QString want = f.DataDir() + QLatin1Char('/') + selected;
         QCOMPARE(f.Child<FolderView>("FolderView1").SelectedPath(), want);
-        QCOMPARE(d.FileNameToSave(), want + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(d.FileNameToSave(), want + u"/מכתב ללקוח"_s);
     }
 
     void handlerShown_data() {
@@ -260,7 +259,7 @@ class TestDialogLoad : public QObject {
         FrmGetDocDet& d = f.Load();
         const auto& m = f.Ui().Messages();
         QVERIFY(!m.empty());
-        QCOMPARE(m.back().text, QStringLiteral("אין זיהוי של עבודה בזורבן במחשב זה"));
+        QCOMPARE(m.back().text, u"אין זיהוי של עבודה בזורבן במחשב זה"_s);
         QCOMPARE(m.back().style, int(vbCritical));
         QCOMPARE(f.Child<QComboBox>("CboStatus").count(), 0);
         QCOMPARE(f.Child<QLineEdit>("TxtTeur").text(), QString());
@@ -281,8 +280,7 @@ class TestDialogLoad : public QObject {
         QFETCH(QString, folder);
         DialogFixture f;
         FrmGetDocDet& d = f.Load();
-        const QString value =
-            name.isEmpty() ? QStringLiteral("name") : f.DataDir() + QLatin1Char('/') + name;
+        const QString value = name.isEmpty() ? u"name"_s : f.DataDir() + QLatin1Char('/') + name;
         d.SetFileNameToSave(value);
         const QStringList before = QDir(f.DataDir()).entryList();
         QCOMPARE(d.FileNameToSave(), value);
@@ -302,13 +300,11 @@ class TestDialogLoad : public QObject {
     void mediumFontMarker() {
         QFETCH(bool, marker);
         DialogFixture f;
-        SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"),
-                    QStringLiteral("MedFontName"), QStringLiteral("DejaVu Serif"));
-        SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"),
-                    QStringLiteral("MedFontSize"), QStringLiteral("13"));
-        QVERIFY(QDir().mkpath(f.DataDir() + QStringLiteral("/GDetDef")));
+        SaveSetting(u"Kavex32"_s, u"General"_s, u"MedFontName"_s, u"DejaVu Serif"_s);
+        SaveSetting(u"Kavex32"_s, u"General"_s, u"MedFontSize"_s, u"13"_s);
+        QVERIFY(QDir().mkpath(f.DataDir() + u"/GDetDef"_s));
         if (marker) {
-            QFile file(f.DataDir() + QStringLiteral("/GDetDef/LB81.1"));
+            QFile file(f.DataDir() + u"/GDetDef/LB81.1"_s);
             QVERIFY(file.open(QIODevice::WriteOnly));
         }
         f.Load();

@@ -55,15 +55,15 @@ class TestDialogNaming : public QObject {
             d.SetIsCaptureMail(captureMail);
             d.SetIsFromScan(fromScan);
         });
-        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN/");
+        const QString mailIn = f.Docs() + u"/MAILIN/"_s;
         auto& name = f.Child<QLineEdit>("TxtTeur");
-        name.setText(QStringLiteral("חוזה שכירות"));
-        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("חוזה שכירות"));
+        name.setText(u"חוזה שכירות"_s);
+        QCOMPARE(d.FileNameToSave(), mailIn + u"חוזה שכירות"_s);
         name.clear();
-        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("חוזה שכירות"));
+        QCOMPARE(d.FileNameToSave(), mailIn + u"חוזה שכירות"_s);
         QCOMPARE(f.Child<QLabel>("LFileName").text(), d.FileNameToSave());
         const QStringList want =
-            asked ? QStringList{QStringLiteral("חובה לקבוע שם למסמך שישמר")} : QStringList{};
+            asked ? QStringList{u"חובה לקבוע שם למסמך שישמר"_s} : QStringList{};
         QCOMPARE(f.Ui().Texts(), want);
         if (asked) {
             QCOMPARE(f.Ui().Messages().front().style, int(vbOKOnly));
@@ -100,7 +100,7 @@ class TestDialogNaming : public QObject {
         QVERIFY(QFileInfo(want).isDir());
         QCOMPARE(f.Child<FolderView>("FolderView1").SelectedPath(), want);
         QCOMPARE(f.Child<QLabel>("LDir").text(), want);
-        QCOMPARE(d.FileNameToSave(), want + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(d.FileNameToSave(), want + u"/מכתב ללקוח"_s);
         QCOMPARE(f.Ui().Texts(), QStringList());
     }
 
@@ -113,7 +113,7 @@ class TestDialogNaming : public QObject {
         QFETCH(bool, choose);
         DialogFixture f;
         FrmGetDocDet& d = f.Load();
-        SetLabels(f, QStringLiteral("5"), QStringLiteral("W"), {}, QStringLiteral("9"), {});
+        SetLabels(f, u"5"_s, u"W"_s, {}, u"9"_s, {});
         d.show();
         f.Ui().QueueModal([&](QWidget& list) {
             if (!choose) {
@@ -121,7 +121,7 @@ class TestDialogNaming : public QObject {
                 return;
             }
             for (auto* b : list.findChildren<QPushButton*>()) {
-                if (b->text() == QStringLiteral("בחר וסגור")) {
+                if (b->text() == u"בחר וסגור"_s) {
                     b->click();
                 }
             }
@@ -130,17 +130,17 @@ class TestDialogNaming : public QObject {
         QCOMPARE(f.Ui().UnexpectedModals(), 0);
         auto& tree = f.Child<FolderView>("FolderView1");
         if (choose) {
-            QCOMPARE(f.Child<QLabel>("LakNum").text(), QStringLiteral("1001"));
-            QCOMPARE(f.Child<QLabel>("LblSug").text(), QStringLiteral("F"));
+            QCOMPARE(f.Child<QLabel>("LakNum").text(), u"1001"_s);
+            QCOMPARE(f.Child<QLabel>("LblSug").text(), u"F"_s);
             QCOMPARE(f.Child<QLabel>("LTik").text(), QString());
             QVERIFY(tree.isVisible());
-            QCOMPARE(tree.SelectedPath(), f.Docs() + QStringLiteral("/DOC1001"));
-            QCOMPARE(d.FileNameToSave(), f.Docs() + QStringLiteral("/DOC1001/מכתב ללקוח"));
+            QCOMPARE(tree.SelectedPath(), f.Docs() + u"/DOC1001"_s);
+            QCOMPARE(d.FileNameToSave(), f.Docs() + u"/DOC1001/מכתב ללקוח"_s);
         } else {
-            QCOMPARE(f.Child<QLabel>("LakNum").text(), QStringLiteral("5"));
-            QCOMPARE(f.Child<QLabel>("LTik").text(), QStringLiteral("9"));
+            QCOMPARE(f.Child<QLabel>("LakNum").text(), u"5"_s);
+            QCOMPARE(f.Child<QLabel>("LTik").text(), u"9"_s);
             QVERIFY(!tree.isVisible());
-            QCOMPARE(tree.SelectedPath(), f.Docs() + QStringLiteral("/MAILIN"));
+            QCOMPARE(tree.SelectedPath(), f.Docs() + u"/MAILIN"_s);
         }
     }
 
@@ -152,12 +152,12 @@ class TestDialogNaming : public QObject {
         d.resize(1000, 800);
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
-        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN");
+        const QString mailIn = f.Docs() + u"/MAILIN"_s;
 
         // Nothing outside the archive can be selected.
-        QVERIFY(!tree.SelectPath(f.DataDir() + QStringLiteral("/Def")));
+        QVERIFY(!tree.SelectPath(f.DataDir() + u"/Def"_s));
         QVERIFY(!tree.SelectPath(f.Root()));
-        QVERIFY(!tree.SelectPath(f.Docs() + QStringLiteral("/../Def")));
+        QVERIFY(!tree.SelectPath(f.Docs() + u"/../Def"_s));
         QCOMPARE(tree.SelectedPath(), mailIn);
 
         // The archive is the only entry at the top of the tree.
@@ -168,31 +168,31 @@ class TestDialogNaming : public QObject {
         for (int row = 0; row < model->rowCount(top); ++row) {
             if (!tree.isRowHidden(row, top)) {
                 ++shown;
-                QCOMPARE(model->index(row, 0, top).data().toString(), QStringLiteral("DOCS"));
+                QCOMPARE(model->index(row, 0, top).data().toString(), u"DOCS"_s);
             }
         }
         QCOMPARE(shown, 1);
 
         // A folder made a moment ago is selected and shown at once.
-        const QString fresh = f.Docs() + QStringLiteral("/DOC77/N/3");
+        const QString fresh = f.Docs() + u"/DOC77/N/3"_s;
         QVERIFY(QDir().mkpath(fresh));
         QVERIFY(tree.SelectPath(fresh));
         QCOMPARE(tree.SelectedPath(), fresh);
-        QCOMPARE(tree.currentIndex().data().toString(), QStringLiteral("3"));
+        QCOMPARE(tree.currentIndex().data().toString(), u"3"_s);
 
         // A click reports the folder into LDir and the target follows.
         const QModelIndex docs = tree.currentIndex().parent().parent().parent();
-        QCOMPARE(docs.data().toString(), QStringLiteral("DOCS"));
+        QCOMPARE(docs.data().toString(), u"DOCS"_s);
         tree.scrollTo(docs);
         QTest::mouseClick(tree.viewport(), Qt::LeftButton, {}, tree.visualRect(docs).center());
         QCOMPARE(f.Child<QLabel>("LDir").text(), f.Docs());
-        QCOMPARE(d.FileNameToSave(), f.Docs() + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(d.FileNameToSave(), f.Docs() + u"/מכתב ללקוח"_s);
     }
 
     void innerFolder() {
         DialogFixture f;
         FrmGetDocDet& d = f.Load();
-        const QString mailIn = f.Docs() + QStringLiteral("/MAILIN");
+        const QString mailIn = f.Docs() + u"/MAILIN"_s;
         auto& inner = f.Child<QComboBox>("CboDocBasic");
         auto& direct = f.Child<QRadioButton>("Option1_0");
         auto& nested = f.Child<QRadioButton>("Option1_1");
@@ -202,28 +202,27 @@ class TestDialogNaming : public QObject {
         QCOMPARE(inner.currentIndex(), 0);
         const QString first = inner.itemText(0);
         QCOMPARE(d.DirToSave(), mailIn + QLatin1Char('/') + first + QLatin1Char('/'));
-        QCOMPARE(d.FileNameToSave(),
-                 mailIn + QLatin1Char('/') + first + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(d.FileNameToSave(), mailIn + QLatin1Char('/') + first + u"/מכתב ללקוח"_s);
         QVERIFY(QFileInfo(mailIn + QLatin1Char('/') + first).isDir());
 
         direct.click();
         QCOMPARE(inner.currentIndex(), -1);
-        QCOMPARE(d.FileNameToSave(), mailIn + QStringLiteral("/מכתב ללקוח"));
+        QCOMPARE(d.FileNameToSave(), mailIn + u"/מכתב ללקוח"_s);
 
         inner.setCurrentIndex(1);
         QVERIFY(nested.isChecked());
         QCOMPARE(d.FileNameToSave(),
-                 mailIn + QLatin1Char('/') + inner.itemText(1) + QStringLiteral("/מכתב ללקוח"));
+                 mailIn + QLatin1Char('/') + inner.itemText(1) + u"/מכתב ללקוח"_s);
     }
 
     void innerFolderWithoutEntries() {
         DialogFixture f;
-        QDir(f.Docs() + QStringLiteral("/DOCBASIC")).removeRecursively();
+        QDir(f.Docs() + u"/DOCBASIC"_s).removeRecursively();
         FrmGetDocDet& d = f.Load();
         QCOMPARE(f.Child<QComboBox>("CboDocBasic").count(), 0);
         f.Child<QRadioButton>("Option1_1").click();
         QCOMPARE(f.Child<QComboBox>("CboDocBasic").currentIndex(), -1);
-        QCOMPARE(d.DirToSave(), f.Docs() + QStringLiteral("/MAILIN/"));
+        QCOMPARE(d.DirToSave(), f.Docs() + u"/MAILIN/"_s);
     }
 
     void numbering_data() {
@@ -243,9 +242,9 @@ class TestDialogNaming : public QObject {
         DialogFixture f;
         SetSourceExt(ext);
         FrmGetDocDet& d = f.Load();
-        SetLabels(f, QStringLiteral("5"), QStringLiteral("F"), {}, {}, {});
+        SetLabels(f, u"5"_s, u"F"_s, {}, {}, {});
         d.RefreshDocsFolder();
-        const QString folder = f.Docs() + QStringLiteral("/DOC5");
+        const QString folder = f.Docs() + u"/DOC5"_s;
         for (const char* file : {"T1.doc", "S7.pdf", "t12.docx", "Tax.doc"}) {
             Touch(folder + QLatin1Char('/') + QLatin1String(file));
         }
@@ -254,10 +253,10 @@ class TestDialogNaming : public QObject {
             inner.setCurrentIndex(0);
             // Files of the inner folder do not count.
             QVERIFY(QDir().mkpath(folder + QLatin1Char('/') + inner.currentText()));
-            Touch(folder + QLatin1Char('/') + inner.currentText() + QStringLiteral("/T50.doc"));
+            Touch(folder + QLatin1Char('/') + inner.currentText() + u"/T50.doc"_s);
         }
         auto& box = f.Child<QLineEdit>("TxtTeur");
-        box.setText(QStringLiteral("שם אחר"));
+        box.setText(u"שם אחר"_s);
         f.Child<QPushButton>("CmdMPlus").click();
         QCOMPARE(box.text(), name);
         const QString dir = useInner ? folder + QLatin1Char('/') + inner.currentText() : folder;

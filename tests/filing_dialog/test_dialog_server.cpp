@@ -11,6 +11,7 @@
 #include "startup/settings.h"
 
 using namespace zv;
+using namespace Qt::Literals::StringLiterals;
 using zv::test::DialogFixture;
 
 namespace {
@@ -49,7 +50,7 @@ class TestDialogServer : public QObject {
 
         // The same rows differ between server and file, so each list tells where it came from.
         for (const bool server : {true, false}) {
-            const QString where = server ? QStringLiteral("שרת") : QStringLiteral("קובץ");
+            const QString where = server ? u"שרת"_s : u"קובץ"_s;
             auto run = [&](const QString& db, const QString& sql) {
                 if (server) {
                     OnServer(options, db, sql);
@@ -57,19 +58,16 @@ class TestDialogServer : public QObject {
                     f.Exec(db, sql);
                 }
             };
-            run(QStringLiteral("OFFICE"), QStringLiteral("DELETE FROM OFF_CODE WHERE CODE=20"));
-            run(QStringLiteral("OFFICE"),
-                QStringLiteral("INSERT INTO OFF_CODE (CODE, NUM, Teur) VALUES (20, 1, '%1')")
+            run(u"OFFICE"_s, u"DELETE FROM OFF_CODE WHERE CODE=20"_s);
+            run(u"OFFICE"_s,
+                u"INSERT INTO OFF_CODE (CODE, NUM, Teur) VALUES (20, 1, '%1')"_s.arg(where));
+            run(u"OFFICE"_s, u"DELETE FROM MTIK"_s);
+            run(u"OFFICE"_s,
+                u"INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (%1, '%2', 1)"_s.arg(server ? 40 : 50)
                     .arg(where));
-            run(QStringLiteral("OFFICE"), QStringLiteral("DELETE FROM MTIK"));
-            run(QStringLiteral("OFFICE"),
-                QStringLiteral("INSERT INTO MTIK (ID, TEUR, SHOW) VALUES (%1, '%2', 1)")
-                    .arg(server ? 40 : 50)
-                    .arg(where));
-            run(QStringLiteral("MDOCS"),
-                QStringLiteral("UPDATE DOCSTATUS SET Caption='%1' WHERE ID=2").arg(where));
+            run(u"MDOCS"_s, u"UPDATE DOCSTATUS SET Caption='%1' WHERE ID=2"_s.arg(where));
         }
-        f.Exec(QStringLiteral("MADAD"),
+        f.Exec(u"MADAD"_s,
                QStringLiteral("UPDATE TRANS_CODE SET Teur='קובץ' WHERE TABLE_NUM='1080' AND "
                               "KOD_NUM_1='1'"));
 
@@ -80,15 +78,14 @@ class TestDialogServer : public QObject {
         QCOMPARE(f.Ui().Texts(), QStringList());
         QCOMPARE(IsOffice(), office);
         QCOMPARE(IsDocs(), docs);
-        const QString officeText = office ? QStringLiteral("שרת") : QStringLiteral("קובץ");
-        const QString docsText = docs ? QStringLiteral("שרת") : QStringLiteral("קובץ");
+        const QString officeText = office ? u"שרת"_s : u"קובץ"_s;
+        const QString docsText = docs ? u"שרת"_s : u"קובץ"_s;
         QCOMPARE(f.Child<QComboBox>("CboTeur").itemText(0), officeText);
         QCOMPARE(f.Child<QComboBox>("CboTeur").count(), 1);
-        QCOMPARE(OptKeyNames().value(office ? QStringLiteral("1040") : QStringLiteral("1050")),
-                 officeText);
+        QCOMPARE(OptKeyNames().value(office ? u"1040"_s : u"1050"_s), officeText);
         QCOMPARE(OptKeyNames().size(), 19);
-        QCOMPARE(f.Child<QComboBox>("CboStatus").currentText(), QStringLiteral("2 - ") + docsText);
-        QCOMPARE(f.Child<QComboBox>("CboPartOf").itemText(0), QStringLiteral("1 - קובץ"));
+        QCOMPARE(f.Child<QComboBox>("CboStatus").currentText(), u"2 - "_s + docsText);
+        QCOMPARE(f.Child<QComboBox>("CboPartOf").itemText(0), u"1 - קובץ"_s);
         QVERIFY(f.Child<QComboBox>("CboSecTeur").count() > 0);
     }
 };

@@ -31,8 +31,8 @@ class TestFolderNaming : public QObject {
         ui_ = std::make_unique<test::ScopedScriptedUi>();
         QVERIFY(QDir().mkpath(env_->DataDir()));
         SetMainPath(env_->DataDir());
-        SetVolnaGlobNum(QStringLiteral("23"));
-        docs_ = env_->DataDir() + QStringLiteral("/DOCS");
+        SetVolnaGlobNum(u"23"_s);
+        docs_ = env_->DataDir() + u"/DOCS"_s;
     }
     void cleanup() {
         ui_.reset();
@@ -102,7 +102,7 @@ class TestFolderNaming : public QObject {
         QFETCH(QString, expected);
         SetVolnaGlobNum(volna);
         if (lcn7) {
-            Touch(env_->DataDir() + QStringLiteral("/LCN7.txt"));
+            Touch(env_->DataDir() + u"/LCN7.txt"_s);
         }
         const QString want = expected.isEmpty() ? docs_ : docs_ + QLatin1Char('/') + expected;
         QCOMPARE(GetDocsDirByClientTik(client, kind, subKind, caseNum, caseCode), want);
@@ -112,9 +112,9 @@ class TestFolderNaming : public QObject {
 
     void clientNumWidth() {
         QCOMPARE(GetClientNumWidth(), int16_t(5));
-        Touch(env_->DataDir() + QStringLiteral("/LCN7.txt"));
+        Touch(env_->DataDir() + u"/LCN7.txt"_s);
         QCOMPARE(GetClientNumWidth(), int16_t(5));
-        SetVolnaGlobNum(QStringLiteral("81005"));
+        SetVolnaGlobNum(u"81005"_s);
         QCOMPARE(GetClientNumWidth(), int16_t(7));
     }
 
@@ -127,12 +127,10 @@ class TestFolderNaming : public QObject {
         QFETCH(bool, development);
         SetIsDevelopmentRun(development);
         QVERIFY(QDir().mkpath(docs_));
-        Touch(docs_ + QStringLiteral("/DOC9"));  // a file where the folder should be
-        QCOMPARE(GetDocsDirByClientTik(QStringLiteral("9"), QStringLiteral("N"), QString(),
-                                       QStringLiteral("1"), QString()),
-                 QString());
-        const bool told = (*ui_)->Texts().contains(QStringLiteral("בעיה בבניית ספריית לקוח/תיק") +
-                                                   QStringLiteral("\r\nDOC9/N/1"));
+        Touch(docs_ + u"/DOC9"_s);  // a file where the folder should be
+        QCOMPARE(GetDocsDirByClientTik(u"9"_s, u"N"_s, QString(), u"1"_s, QString()), QString());
+        const bool told =
+            (*ui_)->Texts().contains(u"בעיה בבניית ספריית לקוח/תיק"_s + u"\r\nDOC9/N/1"_s);
         QCOMPARE(told, development);
     }
 
@@ -165,9 +163,9 @@ class TestFolderNaming : public QObject {
         QFETCH(QString, ext);
         QFETCH(QString, letter);
         QFETCH(QString, expected);
-        const QString folder = docs_ + QStringLiteral("/DOC5/תיק");
+        const QString folder = docs_ + u"/DOC5/תיק"_s;
         QVERIFY(QDir().mkpath(folder));
-        QVERIFY(QDir().mkpath(folder + QStringLiteral("/T99")));  // folders do not count
+        QVERIFY(QDir().mkpath(folder + u"/T99"_s));  // folders do not count
         for (const QString& f : files) {
             Touch(folder + QLatin1Char('/') + f);
         }
@@ -176,11 +174,10 @@ class TestFolderNaming : public QObject {
     }
 
     void nextNumberCreatesFolder() {
-        const QString folder = docs_ + QStringLiteral("/NEW/");
-        QCOMPARE(GetNextFileName(folder, QStringLiteral("PDF"), QStringLiteral("S")),
-                 folder.toUpper() + QStringLiteral("S1.PDF"));
+        const QString folder = docs_ + u"/NEW/"_s;
+        QCOMPARE(GetNextFileName(folder, u"PDF"_s, u"S"_s), folder.toUpper() + u"S1.PDF"_s);
         QVERIFY(QFileInfo(folder).isDir());
-        QCOMPARE(GetNextFileName(QString(), QStringLiteral("PDF"), QStringLiteral("S")), QString());
+        QCOMPARE(GetNextFileName(QString(), u"PDF"_s, u"S"_s), QString());
         QVERIFY((*ui_)->Messages().empty());
     }
 
@@ -199,29 +196,29 @@ class TestFolderNaming : public QObject {
     void numberedName() {
         QFETCH(QString, ext);
         QFETCH(QString, expected);
-        const QString folder = docs_ + QStringLiteral("/DOC5");
+        const QString folder = docs_ + u"/DOC5"_s;
         QVERIFY(QDir().mkpath(folder));
         for (const char* f : {"T1.doc", "T7.pdf", "t12.docx", "Tax.doc"}) {
             Touch(folder + QLatin1Char('/') + QLatin1String(f));
         }
-        QCOMPARE(NumberedName(QStringLiteral("מכתב ללקוח"), ext, folder), expected);
-        QCOMPARE(NumberedName(QStringLiteral("x"), ext, QString()), std::nullopt);
+        QCOMPARE(NumberedName(u"מכתב ללקוח"_s, ext, folder), expected);
+        QCOMPARE(NumberedName(u"x"_s, ext, QString()), std::nullopt);
     }
 
     void pathHelpers() {
-        QCOMPARE(CCpath(QStringLiteral("a")), QStringLiteral("a") + QDir::separator());
-        QCOMPARE(CCpath(QStringLiteral("a/")), QStringLiteral("a/"));
-        QCOMPARE(CCpath(QStringLiteral("a\\")), QStringLiteral("a\\"));
+        QCOMPARE(CCpath(u"a"_s), u"a"_s + QDir::separator());
+        QCOMPARE(CCpath(u"a/"_s), u"a/"_s);
+        QCOMPARE(CCpath(u"a\\"_s), u"a\\"_s);
         QVERIFY((*ui_)->Messages().empty());
         QCOMPARE(CCpath(QString()), QString());
-        QCOMPARE((*ui_)->Texts(), QStringList{QStringLiteral("אין הגדרת ספריה לעבודה")});
+        QCOMPARE((*ui_)->Texts(), QStringList{u"אין הגדרת ספריה לעבודה"_s});
         QCOMPARE((*ui_)->Messages().front().style, int(vbCritical));
 
-        QCOMPARE(TruncateFileName(QStringLiteral("\\DOCS\\DOC5\\a.doc")), QStringLiteral("a.doc"));
-        QCOMPARE(TruncateFileName(QStringLiteral("/x/y/b")), QStringLiteral("b"));
-        QCOMPARE(TruncateFileName(QStringLiteral("c.doc")), QStringLiteral("c.doc"));
+        QCOMPARE(TruncateFileName(u"\\DOCS\\DOC5\\a.doc"_s), u"a.doc"_s);
+        QCOMPARE(TruncateFileName(u"/x/y/b"_s), u"b"_s);
+        QCOMPARE(TruncateFileName(u"c.doc"_s), u"c.doc"_s);
         QCOMPARE(TruncateFileName(QString()), QString());
-        QCOMPARE(TruncateFileName(QStringLiteral("dir/")), QString());
+        QCOMPARE(TruncateFileName(u"dir/"_s), QString());
     }
 
   private:

@@ -26,6 +26,8 @@
 #include "util/state.h"
 #include "watchdog.h"
 
+using namespace Qt::Literals::StringLiterals;
+
 #ifndef ZV_SELECTION_SERVER
 #define ZV_SELECTION_SERVER 0
 #endif
@@ -62,11 +64,11 @@ ChoiceLabels EarlierChoice() {
 }
 
 QTableView* Grid(ListWindow& w) {
-    return w.findChild<QTableView*>(QStringLiteral("TDBGrid1"));
+    return w.findChild<QTableView*>(u"TDBGrid1"_s);
 }
 
 QString Counter(ListWindow& w) {
-    const auto name = kServer ? QStringLiteral("AdoData") : QStringLiteral("Data1");
+    const auto name = kServer ? u"AdoData"_s : u"Data1"_s;
     return w.findChild<QLabel*>(name)->text();
 }
 
@@ -75,7 +77,7 @@ void Click(ListWindow& w, const char* button) {
 }
 
 void Search(ListWindow& w, const QString& text) {
-    auto* box = w.findChild<QLineEdit*>(QStringLiteral("txtSearch"));
+    auto* box = w.findChild<QLineEdit*>(u"txtSearch"_s);
     box->setText(text);
     QTest::keyClick(box, Qt::Key_Return);
 }
@@ -115,9 +117,9 @@ using RowTest = std::function<bool(const QSqlRecord&)>;
 
 RowTest RowOf(const QString& lakNum, int optKey, const QString& tikId = {}) {
     return [=](const QSqlRecord& r) {
-        return r.value(QStringLiteral("LakNum")).toString() == lakNum &&
-               r.value(QStringLiteral("OptKey")).toInt() == optKey &&
-               (tikId.isNull() || r.value(QStringLiteral("TIK_ID")).toString() == tikId);
+        return r.value(u"LakNum"_s).toString() == lakNum &&
+               r.value(u"OptKey"_s).toInt() == optKey &&
+               (tikId.isNull() || r.value(u"TIK_ID"_s).toString() == tikId);
     };
 }
 
@@ -147,9 +149,9 @@ template <>
 char* toString(const zv::GridColumns& columns) {
     QStringList out;
     for (const auto& c : columns) {
-        out << QStringLiteral("%1/%2/%3/%4").arg(c.caption, c.field).arg(c.width).arg(c.visible);
+        out << u"%1/%2/%3/%4"_s.arg(c.caption, c.field).arg(c.width).arg(c.visible);
     }
-    return qstrdup(out.join(QStringLiteral(", ")).toUtf8().constData());
+    return qstrdup(out.join(u", "_s).toUtf8().constData());
 }
 }  // namespace QTest
 
@@ -217,11 +219,11 @@ void TestSelection::initTestCase() {
     Restore();
 
     // A client whose number holds an apostrophe, with cases of its own.
-    auto office = Database::Open(QStringLiteral("OFFICE"), kServer);
+    auto office = Database::Open(u"OFFICE"_s, kServer);
     office->Execute(
         QStringLiteral("INSERT INTO CLIENT (NUM, F_NAME, L_NAME, TELEFON) "
                        "VALUES ('77''7', 'אנה', 'טל', '03-7777777')"));
-    auto zorva = Database::Open(QStringLiteral("ZORVA"), kServer);
+    auto zorva = Database::Open(u"ZORVA"_s, kServer);
     const char* rows[] = {
         "('77''7', 0, 'F', NULL, NULL, NULL)",      "('77''7', 1, 'N', '1', '77''7-1', NULL)",
         "('77''7', 11, 'T', '2', '77''7-2', '2')",  "('77''7', 11, 'T', '3', '77''7-3', '3')",
@@ -230,8 +232,7 @@ void TestSelection::initTestCase() {
     for (const char* row : rows) {
         zorva->Execute(QStringLiteral("INSERT INTO LOOKFOR (LakNum, OptKey, Sug, Tik, Code, "
                                       "TIK_ID, F_NAME, L_NAME, TELEFON) VALUES ") +
-                       QString::fromUtf8(row).chopped(1) +
-                       QStringLiteral(", 'אנה', 'טל', '03-7777777')"));
+                       QString::fromUtf8(row).chopped(1) + u", 'אנה', 'טל', '03-7777777')"_s);
     }
 }
 
@@ -241,7 +242,7 @@ void TestSelection::Restore() {
     SetMyUser(state_.value("MyUser"));
     SetVolnaGlobNum(state_.value("VolnaGlobNum"));
     if (kServer) {
-        SetProvider(QStringLiteral("PostgreSQL"));
+        SetProvider(u"PostgreSQL"_s);
         SetDataSource(state_.value("DataSource"));
         SetUserID(state_.value("UserID"));
         SetPassWord(state_.value("PassWord"));
@@ -255,9 +256,8 @@ void TestSelection::init() {
     Restore();
     watchdog_ = std::make_unique<test::Watchdog>(std::chrono::seconds(60));
     ui_ = std::make_unique<test::ScopedScriptedUi>();
-    QDir(env_->DataDir() + QStringLiteral("/MGRX")).removeRecursively();
-    SaveSetting(QStringLiteral("KAVEX32"), QStringLiteral("General"),
-                QStringLiteral("AddInOnLakTik"), {});
+    QDir(env_->DataDir() + u"/MGRX"_s).removeRecursively();
+    SaveSetting(u"KAVEX32"_s, u"General"_s, u"AddInOnLakTik"_s, {});
 }
 
 void TestSelection::cleanup() {
@@ -274,14 +274,15 @@ void TestSelection::clientSearch_data() {
     QTest::addColumn<QString>("text");
     QTest::addColumn<QStringList>("nums");
     QTest::addColumn<QString>("counter");
-    QTest::newRow("apostrophe") << "O'Neil" << QStringList{"1004"} << "רשומה מס' 1 מתוך  1";
+    QTest::newRow("apostrophe") << u"O'Neil"_s << QStringList{"1004"} << u"רשומה מס' 1 מתוך  1"_s;
     QTest::newRow("apostrophe in the number")
-        << "77'" << QStringList{"77'7"} << "רשומה מס' 1 מתוך  1";
+        << u"77'"_s << QStringList{"77'7"} << u"רשומה מס' 1 מתוך  1"_s;
     QTest::newRow("many characters")
-        << Wild("O*il") << QStringList{"1004"} << "רשומה מס' 1 מתוך  1";
-    QTest::newRow("one character") << Wild("Sh?un") << QStringList{"1004"} << "רשומה מס' 1 מתוך  1";
-    QTest::newRow("telephone") << "03-502" << QStringList{"1002"} << "רשומה מס' 1 מתוך  1";
-    QTest::newRow("no hits") << "zzz" << QStringList{} << "רשומה מס' 0 מתוך  0";
+        << Wild("O*il") << QStringList{"1004"} << u"רשומה מס' 1 מתוך  1"_s;
+    QTest::newRow("one character")
+        << Wild("Sh?un") << QStringList{"1004"} << u"רשומה מס' 1 מתוך  1"_s;
+    QTest::newRow("telephone") << u"03-502"_s << QStringList{"1002"} << u"רשומה מס' 1 מתוך  1"_s;
+    QTest::newRow("no hits") << u"zzz"_s << QStringList{} << u"רשומה מס' 0 מתוך  0"_s;
 }
 
 void TestSelection::clientSearch() {
@@ -293,10 +294,10 @@ void TestSelection::clientSearch() {
     // Every client, by number, read as far as the grid shows them.
     QCOMPARE(w.RecordCount(), kClientCount + 1);
     QVERIFY(w.Model().rowCount() < kClientCount);
-    QCOMPARE(Counter(w), QStringLiteral("רשומה מס' 1 מתוך  1,501"));
-    QCOMPARE(w.CurrentRecord().value("NUM").toString(), QStringLiteral("10001"));
+    QCOMPARE(Counter(w), u"רשומה מס' 1 מתוך  1,501"_s);
+    QCOMPARE(w.CurrentRecord().value("NUM").toString(), u"10001"_s);
     // Counting leaves the rows that follow the first batch to be read, none lost or repeated.
-    const auto all = Column(w, QStringLiteral("NUM"));
+    const auto all = Column(w, u"NUM"_s);
     QCOMPARE(all.size(), kClientCount + 1);
     QCOMPARE(QSet<QString>(all.begin(), all.end()).size(), kClientCount + 1);
     auto sorted = all;
@@ -304,9 +305,9 @@ void TestSelection::clientSearch() {
     QCOMPARE(all, sorted);
 
     Grid(w)->setCurrentIndex(w.Model().index(40, 0));
-    QCOMPARE(Counter(w), QStringLiteral("רשומה מס' 41 מתוך  1,501"));
+    QCOMPARE(Counter(w), u"רשומה מס' 41 מתוך  1,501"_s);
     Search(w, text);
-    QCOMPARE(Column(w, QStringLiteral("NUM")), nums);
+    QCOMPARE(Column(w, u"NUM"_s), nums);
     QCOMPARE(Counter(w), counter);
     QCOMPARE(w.HasCurrentRow(), !nums.isEmpty());
     for (int row = 0; row < w.Model().rowCount(); ++row) {
@@ -317,11 +318,11 @@ void TestSelection::clientSearch() {
 void TestSelection::enterSearches() {
     ListWindow w(kClients);
     w.show();
-    auto* box = w.findChild<QLineEdit*>(QStringLiteral("txtSearch"));
-    QTest::keyClicks(box, QStringLiteral("O'Neil"));
+    auto* box = w.findChild<QLineEdit*>(u"txtSearch"_s);
+    QTest::keyClicks(box, u"O'Neil"_s);
     QCOMPARE(w.RecordCount(), kClientCount + 1);
     QTest::keyClick(box, Qt::Key_Enter);
-    QCOMPARE(Column(w, QStringLiteral("NUM")), QStringList{"1004"});
+    QCOMPARE(Column(w, u"NUM"_s), QStringList{"1004"});
     box->clear();
     Click(w, "cmdSearch");
     QCOMPARE(w.RecordCount(), kClientCount + 1);
@@ -339,7 +340,7 @@ void TestSelection::searchBoxSwitchesToHebrew() {
 
       private:
         QStringList& loaded_;
-        QString active_ = QStringLiteral("00000409");
+        QString active_ = u"00000409"_s;
     };
     QStringList loaded;
     auto previous = SetKeyboardPlatform(std::make_unique<Recorder>(loaded));
@@ -347,7 +348,7 @@ void TestSelection::searchBoxSwitchesToHebrew() {
         ListWindow w(variant);
         w.show();
         QFocusEvent focus(QEvent::FocusIn);
-        QApplication::sendEvent(w.findChild<QLineEdit*>(QStringLiteral("txtSearch")), &focus);
+        QApplication::sendEvent(w.findChild<QLineEdit*>(u"txtSearch"_s), &focus);
     }
     SetKeyboardPlatform(std::move(previous));
     QCOMPARE(loaded, QStringList{"0000040D"});
@@ -369,19 +370,19 @@ void TestSelection::currentRowMarking() {
 
 void TestSelection::unreachableDatabaseReported() {
     if (kServer) {
-        SetDataSource(env_->Root() + QStringLiteral("/no-server,1"));
+        SetDataSource(env_->Root() + u"/no-server,1"_s);
     } else {
-        SetMainPath(env_->Root() + QStringLiteral("/no-installation"));
+        SetMainPath(env_->Root() + u"/no-installation"_s);
     }
     ListWindow w(kNames);
     w.show();
     QCOMPARE(w.RecordCount(), 0);
-    QCOMPARE(Counter(w), QStringLiteral("רשומה מס' 0 מתוך  0"));
-    Search(w, QStringLiteral("כהן"));
+    QCOMPARE(Counter(w), u"רשומה מס' 0 מתוך  0"_s);
+    Search(w, u"כהן"_s);
     const auto texts = (*ui_)->Texts();
     QCOMPARE(texts.size(), 2);
-    QVERIFY2(texts[0].contains(QStringLiteral("--")), qPrintable(texts[0]));
-    QCOMPARE(texts[1], QStringLiteral("424-DoSearch-Object required"));
+    QVERIFY2(texts[0].contains(u"--"_s), qPrintable(texts[0]));
+    QCOMPARE(texts[1], u"424-DoSearch-Object required"_s);
     (*ui_)->Clear();
 }
 
@@ -390,16 +391,13 @@ void TestSelection::namesOfOneClient_data() {
     QTest::addColumn<QString>("text");
     QTest::addColumn<QStringList>("kinds");
     const QStringList all1001{"1", "2", "3", "4", "5", "6", "10", "11", "11"};
-    QTest::newRow("opened for a client") << "1001"
-                                         << "" << all1001;
-    QTest::newRow("client number with an apostrophe") << "77'7"
-                                                      << "" << QStringList{"1", "11", "11", "11"};
-    QTest::newRow("searched by name") << "1001"
-                                      << "ישראל" << all1001;
-    QTest::newRow("searched by case") << "77'7"
-                                      << "4" << QStringList{"11"};
-    QTest::newRow("kinds outside the list") << "1002"
-                                            << "" << QStringList{"4", "11", "11", "11"};
+    QTest::newRow("opened for a client") << u"1001"_s << u""_s << all1001;
+    QTest::newRow("client number with an apostrophe")
+        << u"77'7"_s << u""_s << QStringList{"1", "11", "11", "11"};
+    QTest::newRow("searched by name") << u"1001"_s << u"ישראל"_s << all1001;
+    QTest::newRow("searched by case") << u"77'7"_s << u"4"_s << QStringList{"11"};
+    QTest::newRow("kinds outside the list")
+        << u"1002"_s << u""_s << QStringList{"4", "11", "11", "11"};
 }
 
 void TestSelection::namesOfOneClient() {
@@ -412,10 +410,10 @@ void TestSelection::namesOfOneClient() {
     if (!text.isEmpty()) {
         Search(w, text);
     }
-    QCOMPARE(Column(w, QStringLiteral("OptKey")), kinds);
-    QCOMPARE(Column(w, QStringLiteral("LakNum")), QStringList(kinds.size(), client));
+    QCOMPARE(Column(w, u"OptKey"_s), kinds);
+    QCOMPARE(Column(w, u"LakNum"_s), QStringList(kinds.size(), client));
     // Within a kind, by case number.
-    const auto tiks = Column(w, QStringLiteral("Tik"));
+    const auto tiks = Column(w, u"Tik"_s);
     for (int i = 1; i < tiks.size(); ++i) {
         QVERIFY(kinds[i] != kinds[i - 1] || tiks[i - 1] <= tiks[i]);
     }
@@ -425,7 +423,7 @@ void TestSelection::allNames() {
     ListWindow w(kNames);
     w.show();
     QCOMPARE(w.Model().rowCount(), 0);
-    QCOMPARE(Counter(w), QStringLiteral("רשומה מס' 0 מתוך  0"));
+    QCOMPARE(Counter(w), u"רשומה מס' 0 מתוך  0"_s);
     Search(w, {});
     const QSet<int> listed{0, 1, 2, 3, 4, 5, 6, 10, 11};
     QCOMPARE(
@@ -444,11 +442,11 @@ void TestSelection::allNames() {
 void TestSelection::namesSearch_data() {
     QTest::addColumn<QString>("text");
     QTest::addColumn<QStringList>("rows");  // LakNum:OptKey
-    QTest::newRow("last name reaches other kinds") << "רוזן" << QStringList{"1005:15"};
-    QTest::newRow("first name does not") << "יוסי" << QStringList{};
-    QTest::newRow("apostrophe") << "ג'ב" << QStringList{"1003:0", "1003:1", "1003:9", "1003:11"};
+    QTest::newRow("last name reaches other kinds") << u"רוזן"_s << QStringList{"1005:15"};
+    QTest::newRow("first name does not") << u"יוסי"_s << QStringList{};
+    QTest::newRow("apostrophe") << u"ג'ב"_s << QStringList{"1003:0", "1003:1", "1003:9", "1003:11"};
     QTest::newRow("wildcard") << Wild("O*Ne?l") << QStringList{"1004:0", "1004:2", "1004:3"};
-    QTest::newRow("no hits") << "zzz" << QStringList{};
+    QTest::newRow("no hits") << u"zzz"_s << QStringList{};
 }
 
 void TestSelection::namesSearch() {
@@ -462,8 +460,7 @@ void TestSelection::namesSearch() {
         found << row.value("LakNum").toString() + ":" + row.value("OptKey").toString();
     }
     QCOMPARE(found, rows);
-    QCOMPARE(Counter(w),
-             QStringLiteral("רשומה מס' %1 מתוך  %2").arg(rows.isEmpty() ? 0 : 1).arg(rows.size()));
+    QCOMPARE(Counter(w), u"רשומה מס' %1 מתוך  %2"_s.arg(rows.isEmpty() ? 0 : 1).arg(rows.size()));
 }
 
 void TestSelection::kindColumn_data() {
@@ -472,20 +469,14 @@ void TestSelection::kindColumn_data() {
     QTest::addColumn<int>("optKey");
     QTest::addColumn<QString>("tikId");
     QTest::addColumn<QString>("shown");
-    QTest::newRow("a case kind") << "ישראלי"
-                                 << "1001" << 4 << "2"
-                                 << "תיק הוצל\"פ";
-    QTest::newRow("general case") << "ישראלי"
-                                  << "1001" << 11 << "26" << (kServer ? "תיק כללי" : "תיקי ירושה");
+    QTest::newRow("a case kind") << u"ישראלי"_s << u"1001"_s << 4 << u"2"_s << u"תיק הוצל\"פ"_s;
+    QTest::newRow("general case") << u"ישראלי"_s << u"1001"_s << 11 << u"26"_s
+                                  << (kServer ? "תיק כללי" : "תיקי ירושה");
     QTest::newRow("general case, unknown kind")
-        << "טל"
-        << "77'7" << 11 << "3" << (kServer ? "תיק כללי" : "");
-    QTest::newRow("general case without kind") << "טל"
-                                               << "77'7" << 11 << ""
-                                               << "תיק כללי";
-    QTest::newRow("kind not in the catalogue") << "רוזן"
-                                               << "1005" << 15 << ""
-                                               << "15";
+        << u"טל"_s << u"77'7"_s << 11 << u"3"_s << (kServer ? "תיק כללי" : "");
+    QTest::newRow("general case without kind")
+        << u"טל"_s << u"77'7"_s << 11 << u""_s << u"תיק כללי"_s;
+    QTest::newRow("kind not in the catalogue") << u"רוזן"_s << u"1005"_s << 15 << u""_s << u"15"_s;
 }
 
 void TestSelection::kindColumn() {
@@ -501,10 +492,10 @@ void TestSelection::kindColumn() {
         return RowOf(client, optKey)(r) && r.value("TIK_ID").toString() == tikId;
     });
     QVERIFY(row >= 0);
-    const auto cell = w.Model().index(row, ColumnOf(w, QStringLiteral("OptKey")));
+    const auto cell = w.Model().index(row, ColumnOf(w, u"OptKey"_s));
     if (!kServer && tikId.isEmpty() && optKey == 11) {
         // A general case without its kind cannot be named; its number is shown.
-        QCOMPARE(cell.data().toString(), QStringLiteral("11"));
+        QCOMPARE(cell.data().toString(), u"11"_s);
     } else {
         QCOMPARE(cell.data().toString(), shown);
     }
@@ -513,8 +504,8 @@ void TestSelection::kindColumn() {
 void TestSelection::layoutSaveReopenReset_data() {
     QTest::addColumn<int>("variant");
     QTest::addColumn<QString>("file");
-    QTest::newRow("clients") << static_cast<int>(kClients) << "AddInLak.grx";
-    QTest::newRow("names") << static_cast<int>(kNames) << "AddInLF.grx";
+    QTest::newRow("clients") << static_cast<int>(kClients) << u"AddInLak.grx"_s;
+    QTest::newRow("names") << static_cast<int>(kNames) << u"AddInLF.grx"_s;
 }
 
 void TestSelection::layoutSaveReopenReset() {
@@ -561,26 +552,23 @@ void TestSelection::brokenLayoutFile() {
     w.show();
     QCOMPARE(w.ShownColumns(), ClientColumns());
     QCOMPARE((*ui_)->Texts().size(), 1);
-    QVERIFY((*ui_)->Texts().first().startsWith(QStringLiteral("5-GetTeurTik-")));
+    QVERIFY((*ui_)->Texts().first().startsWith(u"5-GetTeurTik-"_s));
     (*ui_)->Clear();
 }
 
 void TestSelection::check1Persisted() {
-    auto stored = [] {
-        return GetSetting(QStringLiteral("KAVEX32"), QStringLiteral("General"),
-                          QStringLiteral("AddInOnLakTik"));
-    };
+    auto stored = [] { return GetSetting(u"KAVEX32"_s, u"General"_s, u"AddInOnLakTik"_s); };
     for (const bool tick : {true, false}) {
         ListWindow w(kNames);
         w.show();
-        auto* box = w.findChild<QCheckBox*>(QStringLiteral("Check1"));
+        auto* box = w.findChild<QCheckBox*>(u"Check1"_s);
         QCOMPARE(box->isChecked(), !tick);
         box->click();
-        QCOMPARE(stored(), tick ? QStringLiteral("1") : QStringLiteral("0"));
+        QCOMPARE(stored(), tick ? u"1"_s : u"0"_s);
         w.close();
         ListWindow again(kNames);
         again.show();
-        QCOMPARE(again.findChild<QCheckBox*>(QStringLiteral("Check1"))->isChecked(), tick);
+        QCOMPARE(again.findChild<QCheckBox*>(u"Check1"_s)->isChecked(), tick);
     }
 }
 
@@ -588,14 +576,10 @@ void TestSelection::chooseClient_data() {
     QTest::addColumn<QString>("num");
     QTest::addColumn<QString>("name");
     QTest::addColumn<bool>("doubleClick");
-    QTest::newRow("both names") << "1004"
-                                << "Shaun O'Neil" << false;
-    QTest::newRow("last name only") << "1002"
-                                    << "עיריית חולון" << true;
-    QTest::newRow("no name") << "1012"
-                             << "" << false;
-    QTest::newRow("apostrophe in the number") << "77'7"
-                                              << "אנה טל" << true;
+    QTest::newRow("both names") << u"1004"_s << u"Shaun O'Neil"_s << false;
+    QTest::newRow("last name only") << u"1002"_s << u"עיריית חולון"_s << true;
+    QTest::newRow("no name") << u"1012"_s << u""_s << false;
+    QTest::newRow("apostrophe in the number") << u"77'7"_s << u"אנה טל"_s << true;
 }
 
 void TestSelection::chooseClient() {
@@ -604,7 +588,7 @@ void TestSelection::chooseClient() {
     QFETCH(bool, doubleClick);
     (*ui_)->QueueModal([&](QWidget& window) {
         auto& w = dynamic_cast<ListWindow&>(window);
-        QCOMPARE(w.objectName(), kServer ? QStringLiteral("FrmLakAdo") : QStringLiteral("FrmLak"));
+        QCOMPARE(w.objectName(), kServer ? u"FrmLakAdo"_s : u"FrmLak"_s);
         Search(w, num);
         const int row = SelectRow(w, [&](const QSqlRecord& r) { return r.value("NUM") == num; });
         QVERIFY(row >= 0);
@@ -653,12 +637,12 @@ void TestSelection::closingOrEmptyListKeepsClient() {
 void TestSelection::clientTeur_data() {
     QTest::addColumn<QVariant>("num");
     QTest::addColumn<QString>("name");
-    QTest::newRow("both names") << QVariant("1004") << "Shaun O'Neil";
-    QTest::newRow("last name only") << QVariant("1002") << "עיריית חולון";
-    QTest::newRow("apostrophe in the number") << QVariant("77'7") << "אנה טל";
-    QTest::newRow("unknown") << QVariant("99'99") << "99'99";
-    QTest::newRow("number") << QVariant(1005) << "שרה לוי";
-    QTest::newRow("null") << QVariant(QMetaType(QMetaType::QString)) << "";
+    QTest::newRow("both names") << QVariant("1004") << u"Shaun O'Neil"_s;
+    QTest::newRow("last name only") << QVariant("1002") << u"עיריית חולון"_s;
+    QTest::newRow("apostrophe in the number") << QVariant("77'7") << u"אנה טל"_s;
+    QTest::newRow("unknown") << QVariant("99'99") << u"99'99"_s;
+    QTest::newRow("number") << QVariant(1005) << u"שרה לוי"_s;
+    QTest::newRow("null") << QVariant(QMetaType(QMetaType::QString)) << u""_s;
 }
 
 void TestSelection::clientTeur() {
@@ -672,8 +656,7 @@ void TestSelection::clientCaseNeedsClient() {
     QVERIFY(!ChooseClientCase(labels));
     QCOMPARE((*ui_)->ModalCount(), 0);
     QCOMPARE((*ui_)->Messages().size(), size_t{1});
-    QCOMPARE((*ui_)->Messages()[0].text,
-             QStringLiteral("יש להגדיר תחילה לקוח, לפני פתיחת רשימת תיקי לקוח"));
+    QCOMPARE((*ui_)->Messages()[0].text, u"יש להגדיר תחילה לקוח, לפני פתיחת רשימת תיקי לקוח"_s);
     QCOMPARE((*ui_)->Messages()[0].style, int{vbExclamation});
     (*ui_)->Clear();
 }
@@ -684,13 +667,14 @@ void TestSelection::chooseClientCase_data() {
     QTest::addColumn<QString>("tikId");
     QTest::addColumn<QStringList>("labels");
     QTest::newRow("case with a sub-kind")
-        << "1001" << 4 << "2" << QStringList{"1001", "ישראל ישראלי", "H",           "2",
-                                             "4",    "1001-4",       "תיק הוצל\"פ", "ישראל ישראלי"};
-    QTest::newRow("general case") << "1001" << 11 << "26"
+        << u"1001"_s << 4 << u"2"_s
+        << QStringList{"1001", "ישראל ישראלי", "H",           "2",
+                       "4",    "1001-4",       "תיק הוצל\"פ", "ישראל ישראלי"};
+    QTest::newRow("general case") << u"1001"_s << 11 << u"26"_s
                                   << QStringList{"1001",   "ישראל ישראלי", "T",           "26", "8",
                                                  "1001-8", "תיקי ירושה",   "ישראל ישראלי"};
     QTest::newRow("general case of an unknown kind")
-        << "77'7" << 11 << "3"
+        << u"77'7"_s << 11 << u"3"_s
         << QStringList{"77'7", "אנה טל", "T", "3", "3", "77'7-3", "", "אנה טל"};
 }
 
@@ -719,28 +703,23 @@ void TestSelection::chooseCaseByName_data() {
     QTest::addColumn<QString>("sug");
     QTest::addColumn<bool>("taken");
     QTest::addColumn<QStringList>("labels");
-    QTest::newRow("client") << "O'Neil"
-                            << "1004" << 0 << "F" << true
+    QTest::newRow("client") << u"O'Neil"_s << u"1004"_s << 0 << u"F"_s << true
                             << QStringList{"1004", "Shaun O'Neil", "F",    "",
                                            "12",   "1004",         "לקוח", "Shaun O'Neil"};
     QTest::newRow("blank sub-kind")
-        << "עיריית"
-        << "1002" << 4 << "H" << true
+        << u"עיריית"_s << u"1002"_s << 4 << u"H"_s << true
         << QStringList{"1002", "עיריית חולון", "H",           "0",
                        "1",    "1002-1",       "תיק הוצל\"פ", "עיריית חולון"};
-    QTest::newRow("general case") << "ישראלי"
-                                  << "1001" << 11 << "T" << true
+    QTest::newRow("general case") << u"ישראלי"_s << u"1001"_s << 11 << u"T"_s << true
                                   << QStringList{"1001", "ישראל ישראלי", "T",           "26", "8",
                                                  "8",    "תיקי ירושה",   "ישראל ישראלי"};
     QTest::newRow("kind 17, known letter")
-        << "שטרן"
-        << "1005" << 17 << "W" << true
+        << u"שטרן"_s << u"1005"_s << 17 << u"W"_s << true
         << QStringList{"1005", "שרה לוי", "W", "0", "3", "1005-3", "תיק מיוחד", "אורי שטרן"};
     QTest::newRow("kind 17, unknown letter")
-        << "גולן"
-        << "1005" << 17 << "X" << false << Fields(EarlierChoice());
-    QTest::newRow("kind without a rule") << "רוזן"
-                                         << "1005" << 15 << "A" << false << Fields(EarlierChoice());
+        << u"גולן"_s << u"1005"_s << 17 << u"X"_s << false << Fields(EarlierChoice());
+    QTest::newRow("kind without a rule")
+        << u"רוזן"_s << u"1005"_s << 15 << u"A"_s << false << Fields(EarlierChoice());
 }
 
 void TestSelection::chooseCaseByName() {
@@ -752,8 +731,7 @@ void TestSelection::chooseCaseByName() {
     QFETCH(QStringList, labels);
     (*ui_)->QueueModal([&](QWidget& window) {
         auto& w = dynamic_cast<ListWindow&>(window);
-        QCOMPARE(w.objectName(),
-                 kServer ? QStringLiteral("FrmLookForAdo") : QStringLiteral("FrmLookFor"));
+        QCOMPARE(w.objectName(), kServer ? u"FrmLookForAdo"_s : u"FrmLookFor"_s);
         QVERIFY(w.ClientNum().isEmpty());
         Search(w, text);
         QVERIFY(SelectRow(w, [&](const QSqlRecord& r) {
@@ -770,12 +748,12 @@ void TestSelection::closingNamesWindowChangesNothing() {
     for (const bool byName : {false, true}) {
         (*ui_)->QueueModal([](QWidget& window) {
             auto& w = dynamic_cast<ListWindow&>(window);
-            Search(w, QStringLiteral("ישראלי"));
+            Search(w, u"ישראלי"_s);
             Grid(w)->setCurrentIndex(w.Model().index(2, 0));
             w.close();
         });
         auto labels = EarlierChoice();
-        labels.lakNum = QStringLiteral("1001");
+        labels.lakNum = u"1001"_s;
         const auto before = Fields(labels);
         QVERIFY(!(byName ? ChooseCaseByName(labels) : ChooseClientCase(labels)));
         QCOMPARE(Fields(labels), before);

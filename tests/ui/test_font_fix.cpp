@@ -27,14 +27,14 @@ using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
-const QString kArial = QStringLiteral("Arial");
+const QString kArial = u"Arial"_s;
 
 // A window with one control of each interesting kind, all in Arial 11.
 class Window : public QWidget {
   public:
     Window() {
-        setObjectName(QStringLiteral("FrmTest"));
-        Add<QCheckBox>("ChkMarlett")->setFont(QFont(QStringLiteral("Marlett"), 11));
+        setObjectName(u"FrmTest"_s);
+        Add<QCheckBox>("ChkMarlett")->setFont(QFont(u"Marlett"_s, 11));
         Add<QCheckBox>("CmdSearch");
         Add<QCheckBox>("chkcolor_2");  // member of an exempt control array, other case
         Add<QPushButton>("CmdSearchTik")->setCheckable(true);
@@ -48,7 +48,7 @@ class Window : public QWidget {
         Add<QGroupBox>("Frame1");
         Add<QTableView>("TDBGrid1");
         auto* date = new GDate(this);
-        date->setObjectName(QStringLiteral("TDate"));
+        date->setObjectName(u"TDate"_s);
     }
 
     QWidget& Control(const char* name) {
@@ -68,13 +68,13 @@ class Window : public QWidget {
 };
 
 void WriteMarker(const QString& dataDir, const QString& user) {
-    QDir().mkpath(dataDir + QStringLiteral("/GDetDef"));
-    QFile marker(dataDir + QStringLiteral("/GDetDef/StopFixFonts.") + user);
+    QDir().mkpath(dataDir + u"/GDetDef"_s);
+    QFile marker(dataDir + u"/GDetDef/StopFixFonts."_s + user);
     QVERIFY(marker.open(QIODevice::WriteOnly));
 }
 
 void SaveGeneral(const QString& key, const QString& value) {
-    SaveSetting(QStringLiteral("Kavex32"), QStringLiteral("General"), key, value);
+    SaveSetting(u"Kavex32"_s, u"General"_s, key, value);
 }
 
 }  // namespace
@@ -106,7 +106,7 @@ void TestFontFix::init() {
     ui_ = std::make_unique<test::ScopedScriptedUi>();
     QDir().mkpath(env_->DataDir());
     SetMainPath(env_->DataDir());
-    SetMyUser(QStringLiteral("7"));
+    SetMyUser(u"7"_s);
 }
 
 void TestFontFix::cleanup() {
@@ -151,11 +151,11 @@ void TestFontFix::fixesControls() {
 }
 
 void TestFontFix::fixedFontHasHebrewGlyphs() {
-    QLabel label(QStringLiteral("שלום"));
-    label.setObjectName(QStringLiteral("Label1"));
+    QLabel label(u"שלום"_s);
+    label.setObjectName(u"Label1"_s);
     FixControlCharset(label);
     const QFontMetrics metrics(label.font());
-    for (const QChar ch : QStringLiteral("אבגדהוזחטיכלמנסעפצקרשת")) {
+    for (const QChar ch : u"אבגדהוזחטיכלמנסעפצקרשת"_s) {
         QVERIFY2(metrics.inFont(ch), qPrintable(QFontInfo(label.font()).family()));
     }
 }
@@ -163,8 +163,8 @@ void TestFontFix::fixedFontHasHebrewGlyphs() {
 void TestFontFix::markerStopsOnlyItsUser_data() {
     QTest::addColumn<QString>("markerUser");
     QTest::addColumn<bool>("fixed");
-    QTest::newRow("marker of this user") << QStringLiteral("7") << false;
-    QTest::newRow("marker of another user") << QStringLiteral("8") << true;
+    QTest::newRow("marker of this user") << u"7"_s << false;
+    QTest::newRow("marker of another user") << u"8"_s << true;
     QTest::newRow("no marker") << QString() << true;
 }
 
@@ -228,59 +228,59 @@ void TestFontFix::mediumFont() {
 }
 
 void TestFontFix::mediumFontSpecialPairIsCached() {
-    SaveGeneral(QStringLiteral("MedFontNameSpe"), QStringLiteral("Tahoma"));
-    SaveGeneral(QStringLiteral("MedFontSizeSpe"), QStringLiteral("10"));
+    SaveGeneral(u"MedFontNameSpe"_s, u"Tahoma"_s);
+    SaveGeneral(u"MedFontSizeSpe"_s, u"10"_s);
     QLabel first;
     SetMedFont(first);
-    SaveGeneral(QStringLiteral("MedFontNameSpe"), QStringLiteral("Courier"));
-    SaveGeneral(QStringLiteral("MedFontSizeSpe"), QStringLiteral("14"));
+    SaveGeneral(u"MedFontNameSpe"_s, u"Courier"_s);
+    SaveGeneral(u"MedFontSizeSpe"_s, u"14"_s);
     QLabel second;
     SetMedFont(second);
-    QCOMPARE(second.font().family(), QStringLiteral("Tahoma"));
+    QCOMPARE(second.font().family(), u"Tahoma"_s);
     QCOMPARE(second.font().pointSizeF(), 10.0);
 }
 
 void TestFontFix::mediumFontFallbackIsReadEachTime() {
-    SaveGeneral(QStringLiteral("MedFontName"), QStringLiteral("Tahoma"));
-    SaveGeneral(QStringLiteral("MedFontSize"), QStringLiteral("9"));
+    SaveGeneral(u"MedFontName"_s, u"Tahoma"_s);
+    SaveGeneral(u"MedFontSize"_s, u"9"_s);
     QLabel first;
     SetMedFont(first);
-    QCOMPARE(first.font().family(), QStringLiteral("Tahoma"));
-    SaveGeneral(QStringLiteral("MedFontName"), QStringLiteral("Courier"));
-    SaveGeneral(QStringLiteral("MedFontSize"), QStringLiteral("14"));
+    QCOMPARE(first.font().family(), u"Tahoma"_s);
+    SaveGeneral(u"MedFontName"_s, u"Courier"_s);
+    SaveGeneral(u"MedFontSize"_s, u"14"_s);
     QLabel second;
     SetMedFont(second);
-    QCOMPARE(second.font().family(), QStringLiteral("Courier"));
+    QCOMPARE(second.font().family(), u"Courier"_s);
     QCOMPARE(second.font().pointSizeF(), 14.0);
 }
 
 void TestFontFix::mediumFontBadSizeIsReported() {
-    SaveGeneral(QStringLiteral("MedFontNameSpe"), QStringLiteral("Tahoma"));
-    SaveGeneral(QStringLiteral("MedFontSizeSpe"), QStringLiteral("1e999"));
+    SaveGeneral(u"MedFontNameSpe"_s, u"Tahoma"_s);
+    SaveGeneral(u"MedFontSizeSpe"_s, u"1e999"_s);
     QLabel label;
     label.setFont(QFont(kArial, 11));
     SetMedFont(label);
-    QCOMPARE((*ui_)->Texts(), QStringList{QStringLiteral("6-0--Overflow")});
+    QCOMPARE((*ui_)->Texts(), QStringList{u"6-0--Overflow"_s});
     QCOMPARE(label.font().family(), kArial);
     (*ui_)->Clear();
 }
 
 void TestFontFix::formIsLoaded() {
-    QVERIFY(!FormIsLoaded(QStringLiteral("FrmGetDocDet")));
+    QVERIFY(!FormIsLoaded(u"FrmGetDocDet"_s));
     auto* dialog = new QWidget;
-    dialog->setObjectName(QStringLiteral("FrmGetDocDet"));
+    dialog->setObjectName(u"FrmGetDocDet"_s);
     auto* child = new QWidget(dialog);
-    child->setObjectName(QStringLiteral("CmdOK"));
+    child->setObjectName(u"CmdOK"_s);
     // Loaded, whether shown or hidden; only windows count.
-    QVERIFY(FormIsLoaded(QStringLiteral("frmgetdocdet")));
+    QVERIFY(FormIsLoaded(u"frmgetdocdet"_s));
     dialog->show();
-    QVERIFY(FormIsLoaded(QStringLiteral("FRMGETDOCDET")));
+    QVERIFY(FormIsLoaded(u"FRMGETDOCDET"_s));
     dialog->hide();
-    QVERIFY(FormIsLoaded(QStringLiteral("FrmGetDocDet")));
-    QVERIFY(!FormIsLoaded(QStringLiteral("CmdOK")));
-    QVERIFY(!FormIsLoaded(QStringLiteral("FrmGetDoc")));
+    QVERIFY(FormIsLoaded(u"FrmGetDocDet"_s));
+    QVERIFY(!FormIsLoaded(u"CmdOK"_s));
+    QVERIFY(!FormIsLoaded(u"FrmGetDoc"_s));
     delete dialog;
-    QVERIFY(!FormIsLoaded(QStringLiteral("FrmGetDocDet")));
+    QVERIFY(!FormIsLoaded(u"FrmGetDocDet"_s));
 }
 
 QTEST_MAIN(TestFontFix)
