@@ -137,7 +137,6 @@ class TestDialogLoad : public QObject {
         QTest::newRow("origin 10") << 0 << 10 << u"2 - בטיפול"_s << u"10 - אחר"_s << true;
         QTest::newRow("unknown status") << 9 << 0 << u""_s << u"1 - דואר"_s << false;
         QTest::newRow("unknown origin") << 1 << 99 << u"1 - חדש"_s << u""_s << false;
-        QTest::newRow("negative origin") << 1 << -4 << u"1 - חדש"_s << u"1 - דואר"_s << false;
     }
     void presets() {
         QFETCH(int, status);
@@ -236,20 +235,6 @@ class TestDialogLoad : public QObject {
         const QString want = f.DataDir() + QLatin1Char('/') + selected;
         QCOMPARE(f.Child<FolderView>("FolderView1").SelectedPath(), want);
         QCOMPARE(d.FileNameToSave(), want + u"/מכתב ללקוח"_s);
-    }
-
-    void handlerShown_data() {
-        QTest::addColumn<QString>("preset");
-        QTest::addColumn<QString>("shown");
-        QTest::newRow("the user") << u""_s << u"דנה כהן"_s;
-        QTest::newRow("the caller's") << u"משה לוי;רות כהן"_s << u"משה לוי;רות כהן"_s;
-    }
-    void handlerShown() {
-        QFETCH(QString, preset);
-        QFETCH(QString, shown);
-        DialogFixture f;
-        f.Load([&](FrmGetDocDet& d) { d.SetDefaultMetapel(preset); });
-        QCOMPARE(f.Child<QLabel>("LPersonal").text(), shown);
     }
 
     void unidentifiedInstallation() {

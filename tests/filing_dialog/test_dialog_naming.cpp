@@ -78,11 +78,8 @@ class TestDialogNaming : public QObject {
         QTest::addColumn<QString>("caseCode");
         QTest::addColumn<QString>("folder");  // below DOCS; empty: DOCS itself
         QTest::newRow("client") << u"1001"_s << u"F"_s << u""_s << u""_s << u""_s << u"DOC1001"_s;
-        QTest::newRow("case") << u"5"_s << u"W"_s << u""_s << u"9"_s << u"W-9"_s << u"DOC5/W/9"_s;
         QTest::newRow("bureau, no client")
             << u""_s << u"L"_s << u""_s << u"3"_s << u"12-34"_s << u"DOC00000/L/1234"_s;
-        QTest::newRow("general case")
-            << u"5"_s << u"T"_s << u"27"_s << u"9"_s << u"9"_s << u"DOC5/27/9"_s;
         QTest::newRow("no rule") << u"5"_s << u"FS"_s << u""_s << u""_s << u""_s << u""_s;
     }
     void folderFollowsTheChoice() {
