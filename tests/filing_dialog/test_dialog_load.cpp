@@ -97,13 +97,11 @@ class TestDialogLoad : public QObject {
         QVERIFY(f.Child<QRadioButton>("Option1_0").isChecked());
 
         QCOMPARE(f.Child<GDate>("TDate").date(), QDate(2026, 3, 17));
-        QCOMPARE(f.Child<GDate>("TDateMemo").date(), QDate(2026, 3, 17));
         QCOMPARE(f.Child<GDate>("TDateRecieved").date(), QDate(2026, 3, 17));
         QVERIFY(!f.Child<GDate>("TDate").Enabled());
         QCOMPARE(f.Child<QLineEdit>("TDBTime1").text(), u"08:00"_s);
         QCOMPARE(f.Child<QLabel>("LPersonal").text(), u"דנה כהן"_s);
         QCOMPARE(f.Child<QLabel>("LGlobalNum").text(), u"23/100/1"_s);
-        QCOMPARE(UserCode(), u"100"_s);
 
         auto& name = f.Child<QLineEdit>("TxtTeur");
         QCOMPARE(name.text(), u"מכתב ללקוח"_s);
@@ -114,8 +112,6 @@ class TestDialogLoad : public QObject {
         QVERIFY(tree.isHidden());
         QCOMPARE(tree.SelectedPath(), mailIn);
         QCOMPARE(f.Child<QLabel>("LDir").text(), mailIn);
-        QCOMPARE(d.StartDir(), mailIn);
-        QCOMPARE(d.DirToSave(), mailIn + QLatin1Char('/'));
         QCOMPARE(d.FileNameToSave(), mailIn + u"/מכתב ללקוח"_s);
         QCOMPARE(f.Child<QLabel>("LFileName").text(), d.FileNameToSave());
         QVERIFY(!d.IsCancel());

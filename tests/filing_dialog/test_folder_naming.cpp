@@ -49,47 +49,36 @@ class TestFolderNaming : public QObject {
         QTest::addColumn<bool>("lcn7");
         QTest::addColumn<QString>("expected");  // below DOCS; empty: DOCS itself
 
-        QTest::newRow("client") << u"F"_s << u"123"_s << u""_s << u""_s << u""_s << u"23"_s << false
-                                << u"DOC123"_s;
-        QTest::newRow("no kind") << u""_s << u"123"_s << u""_s << u""_s << u""_s << u"23"_s << false
-                                 << u"DOC123"_s;
-        QTest::newRow("M and R") << u"MR"_s << u"8"_s << u""_s << u""_s << u""_s << u"23"_s << false
-                                 << u"DOC8"_s;
-        QTest::newRow("supplier") << u"S"_s << u"77"_s << u""_s << u""_s << u""_s << u"23"_s
-                                  << false << u"SPK77"_s;
-        QTest::newRow("bureau, placeholder") << u"L"_s << u""_s << u""_s << u""_s << u"12-34"_s
-                                             << u"23"_s << false << u"DOC00000/L/1234"_s;
-        QTest::newRow("bureau, marker without 81005")
-            << u"L"_s << u""_s << u""_s << u""_s << u"12-34"_s << u"23"_s << true
-            << u"DOC00000/L/1234"_s;
-        QTest::newRow("bureau, wide placeholder") << u"L"_s << u""_s << u""_s << u""_s << u"1-2-3"_s
-                                                  << u"81005"_s << true << u"DOC0000000/L/123"_s;
-        QTest::newRow("bureau, client")
-            << u"L"_s << u"5"_s << u""_s << u""_s << u"7"_s << u"81005"_s << true << u"DOC5/L/7"_s;
-        QTest::newRow("general, own kind")
-            << u"T"_s << u"5"_s << u"30"_s << u"9"_s << u""_s << u"23"_s << false << u"DOC5/30/9"_s;
-        QTest::newRow("general, kind 26")
-            << u"T"_s << u"5"_s << u"26"_s << u"9"_s << u""_s << u"23"_s << false << u"DOC5/26/9"_s;
-        QTest::newRow("general, kind 25")
-            << u"T"_s << u"5"_s << u"25"_s << u"9"_s << u""_s << u"23"_s << false << u""_s;
-        QTest::newRow("general, blank kind")
-            << u"T"_s << u"5"_s << u"abc"_s << u"9"_s << u""_s << u"23"_s << false << u""_s;
-        QTest::newRow("tort") << u"N"_s << u"5"_s << u""_s << u"9"_s << u""_s << u"23"_s << false
-                              << u"DOC5/N/9"_s;
-        QTest::newRow("real estate")
-            << u"W"_s << u"5"_s << u""_s << u"9"_s << u""_s << u"23"_s << false << u"DOC5/W/9"_s;
-        QTest::newRow("labour") << u"G"_s << u"5"_s << u""_s << u"9"_s << u""_s << u"23"_s << false
-                                << u"DOC5/G/9"_s;
-        QTest::newRow("debtor") << u"H"_s << u"5"_s << u""_s << u"9"_s << u"4"_s << u"23"_s << false
-                                << u"DOC5/H/4"_s;
-        QTest::newRow("A") << u"A"_s << u"5"_s << u""_s << u"9"_s << u"4"_s << u"23"_s << false
-                           << u"DOC5/A/4"_s;
-        QTest::newRow("two kinds")
-            << u"FS"_s << u"5"_s << u""_s << u""_s << u""_s << u"23"_s << false << u""_s;
-        QTest::newRow("lower case")
-            << u"f"_s << u"5"_s << u""_s << u""_s << u""_s << u"23"_s << false << u""_s;
-        QTest::newRow("unknown") << u"X"_s << u"5"_s << u""_s << u"9"_s << u"4"_s << u"23"_s
-                                 << false << u""_s;
+        // Kind, client, sub-kind, case number, case code, expected; GlobNum and LCN7 marker.
+        const auto row = [](const char* name, const char* kind, const char* client,
+                            const char* subKind, const char* caseNum, const char* caseCode,
+                            const char* expected, const char* volna = "23", bool lcn7 = false) {
+            QTest::newRow(name) << QString(kind) << QString(client) << QString(subKind)
+                                << QString(caseNum) << QString(caseCode) << QString(volna) << lcn7
+                                << QString(expected);
+        };
+        row("client", "F", "123", "", "", "", "DOC123");
+        row("no kind", "", "123", "", "", "", "DOC123");
+        row("M and R", "MR", "8", "", "", "", "DOC8");
+        row("supplier", "S", "77", "", "", "", "SPK77");
+        row("bureau, placeholder", "L", "", "", "", "12-34", "DOC00000/L/1234");
+        row("bureau, marker without 81005", "L", "", "", "", "12-34", "DOC00000/L/1234", "23",
+            true);
+        row("bureau, wide placeholder", "L", "", "", "", "1-2-3", "DOC0000000/L/123", "81005",
+            true);
+        row("bureau, client", "L", "5", "", "", "7", "DOC5/L/7", "81005", true);
+        row("general, own kind", "T", "5", "30", "9", "", "DOC5/30/9");
+        row("general, kind 26", "T", "5", "26", "9", "", "DOC5/26/9");
+        row("general, kind 25", "T", "5", "25", "9", "", "");
+        row("general, blank kind", "T", "5", "abc", "9", "", "");
+        row("tort", "N", "5", "", "9", "", "DOC5/N/9");
+        row("real estate", "W", "5", "", "9", "", "DOC5/W/9");
+        row("labour", "G", "5", "", "9", "", "DOC5/G/9");
+        row("debtor", "H", "5", "", "9", "4", "DOC5/H/4");
+        row("A", "A", "5", "", "9", "4", "DOC5/A/4");
+        row("two kinds", "FS", "5", "", "", "", "");
+        row("lower case", "f", "5", "", "", "", "");
+        row("unknown", "X", "5", "", "9", "4", "");
     }
     void clientCaseFolder() {
         QFETCH(QString, kind);
