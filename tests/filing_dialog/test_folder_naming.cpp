@@ -170,27 +170,6 @@ class TestFolderNaming : public QObject {
         QVERIFY((*ui_)->Messages().empty());
     }
 
-    void numberedName_data() {
-        QTest::addColumn<QString>("ext");
-        QTest::addColumn<QString>("expected");
-        QTest::newRow("doc") << u"doc"_s << u"T13"_s;
-        QTest::newRow("msg") << u"msg"_s << u"E1"_s;
-        QTest::newRow("pdf") << u"pdf"_s << u"S1"_s;
-        QTest::newRow("xlsx: the proposed name") << u"xlsx"_s << u"מכתב ללקוח"_s;
-        QTest::newRow("no extension") << u""_s << u"מכתב ללקוח"_s;
-    }
-    void numberedName() {
-        QFETCH(QString, ext);
-        QFETCH(QString, expected);
-        const QString folder = docs_ + u"/DOC5"_s;
-        QVERIFY(QDir().mkpath(folder));
-        for (const char* f : {"T1.doc", "T7.pdf", "t12.docx", "Tax.doc"}) {
-            Touch(folder + QLatin1Char('/') + QLatin1String(f));
-        }
-        QCOMPARE(NumberedName(u"מכתב ללקוח"_s, ext, folder), expected);
-        QCOMPARE(NumberedName(u"x"_s, ext, QString()), std::nullopt);
-    }
-
     void pathHelpers() {
         QCOMPARE(CCpath(u"a"_s), u"a"_s + QDir::separator());
         QCOMPARE(CCpath(u"a/"_s), u"a/"_s);
