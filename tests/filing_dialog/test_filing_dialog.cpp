@@ -21,6 +21,7 @@
 #include "dialogs/frm_get_users.h"
 #include "filing_dialog/folder_view.h"
 #include "filing_dialog/name_guard.h"
+#include "recording_keyboard.h"
 #include "util/keyboard_layout.h"
 #include "util/settings_store.h"
 
@@ -86,16 +87,6 @@ void SetLabels(DialogFixture& f, const QString& client, const QString& kind, con
 void Type(QWidget& w, QChar c) {
     QTest::sendKeyEvent(QTest::Click, &w, Qt::Key_unknown, QString(c), Qt::NoModifier);
 }
-
-// A keyboard that remembers the layout it was asked for.
-class RecordingKeyboard : public KeyboardPlatform {
-  public:
-    QString ActiveLayoutName() override { return active_; }
-    void LoadLayout(const QString& layoutId) override { active_ = layoutId; }
-
-  private:
-    QString active_ = u"00000409"_s;
-};
 
 }  // namespace
 
@@ -888,7 +879,7 @@ class TestFilingDialog : public QObject {
         QFETCH(QString, control);
         QFETCH(QString, layout);
         DialogFixture f;
-        auto previous = SetKeyboardPlatform(std::make_unique<RecordingKeyboard>());
+        test::ScopedRecordingKeyboard keyboard;
         FrmGetDocDet& d = f.Load();
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
@@ -897,7 +888,6 @@ class TestFilingDialog : public QObject {
         f.Child<QLineEdit>(qPrintable(control)).setFocus();
         QTRY_VERIFY(f.Child<QLineEdit>(qPrintable(control)).hasFocus());
         QCOMPARE(CurrentKeyboardPlatform().ActiveLayoutName(), layout);
-        SetKeyboardPlatform(std::move(previous));
     }
 
     void focusAndEnter() {

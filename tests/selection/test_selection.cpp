@@ -14,6 +14,7 @@
 
 #include "data/database.h"
 #include "data/recordset.h"
+#include "recording_keyboard.h"
 #include "sample_install/sample_install.h"
 #include "sample_install/test_server.h"
 #include "scripted_ui.h"
@@ -317,29 +318,14 @@ void TestSelection::enterSearches() {
 }
 
 void TestSelection::searchBoxSwitchesToHebrew() {
-    class Recorder : public KeyboardPlatform {
-      public:
-        explicit Recorder(QStringList& loaded) : loaded_(loaded) {}
-        QString ActiveLayoutName() override { return active_; }
-        void LoadLayout(const QString& id) override {
-            loaded_ << id;
-            active_ = id;
-        }
-
-      private:
-        QStringList& loaded_;
-        QString active_ = u"00000409"_s;
-    };
-    QStringList loaded;
-    auto previous = SetKeyboardPlatform(std::make_unique<Recorder>(loaded));
+    test::ScopedRecordingKeyboard keyboard;
     for (const auto variant : {kClients, kNames}) {
         ListWindow w(variant);
         w.show();
         QFocusEvent focus(QEvent::FocusIn);
         QApplication::sendEvent(w.findChild<QLineEdit*>(u"txtSearch"_s), &focus);
     }
-    SetKeyboardPlatform(std::move(previous));
-    QCOMPARE(loaded, QStringList{"0000040D"});
+    QCOMPARE(keyboard.Loaded(), QStringList{"0000040D"});
 }
 
 void TestSelection::unreachableDatabaseReported() {
