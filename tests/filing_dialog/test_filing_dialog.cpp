@@ -323,23 +323,13 @@ class TestFilingDialog : public QObject {
         QCOMPARE(f.Ui().Texts(), QStringList());
     }
 
-    void closing_data() {
-        QTest::addColumn<bool>("escape");
-        QTest::newRow("close box") << false;
-        QTest::newRow("escape") << true;
-    }
-    void closing() {
-        QFETCH(bool, escape);
+    void escapeCancels() {
         DialogFixture f;
         FrmGetDocDet& d = f.Load();
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
         QVERIFY(!d.IsCancel());
-        if (escape) {
-            QTest::keyClick(&d, Qt::Key_Escape);
-        } else {
-            d.close();
-        }
+        QTest::keyClick(&d, Qt::Key_Escape);
         QVERIFY(d.IsCancel());
         QVERIFY(d.isHidden());
     }
@@ -575,6 +565,8 @@ class TestFilingDialog : public QObject {
         QTest::newRow("no client, with a name") << u"מכתב"_s << QString() << noClient;
         QTest::newRow("no client, no name") << QString() << QString() << noClient;
         QTest::newRow("no name") << QString() << u"1001"_s << u"יש לקבוע שם לקובץ הנשמר"_s;
+        // Enter in a text box confirms like the button.
+        QTest::newRow("no client, Enter") << u"מכתב"_s << u"enter"_s << noClient;
     }
     void refusals() {
         QFETCH(QString, name);
@@ -585,9 +577,17 @@ class TestFilingDialog : public QObject {
             d.SetDefultName(name);
             d.SetIsCaptureMail(true);
         });
-        f.Child<QLabel>("LakNum").setText(client);
         d.show();
-        f.Child<QPushButton>("CmdOK").click();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        if (client == u"enter"_s) {
+            // The first step has the focus.
+            QCOMPARE(QApplication::focusWidget(), &f.Child<QWidget>("CmdLak"));
+            f.Child<QLineEdit>("TxtRemark").setFocus();
+            QTest::keyClick(&f.Child<QLineEdit>("TxtRemark"), Qt::Key_Return);
+        } else {
+            f.Child<QLabel>("LakNum").setText(client);
+            f.Child<QPushButton>("CmdOK").click();
+        }
         QCOMPARE(f.Ui().Texts(), QStringList{message});
         QCOMPARE(f.Ui().Messages().front().style, int(vbCritical));
         QVERIFY(d.isVisible());
@@ -888,19 +888,6 @@ class TestFilingDialog : public QObject {
         f.Child<QLineEdit>(qPrintable(control)).setFocus();
         QTRY_VERIFY(f.Child<QLineEdit>(qPrintable(control)).hasFocus());
         QCOMPARE(CurrentKeyboardPlatform().ActiveLayoutName(), layout);
-    }
-
-    void focusAndEnter() {
-        DialogFixture f;
-        FrmGetDocDet& d = f.Load();
-        f.Child<QWidget>("FolderView1").show();
-        d.show();
-        QVERIFY(QTest::qWaitForWindowExposed(&d));
-        // The first step has the focus; Enter in a text box confirms.
-        QCOMPARE(QApplication::focusWidget(), &f.Child<QWidget>("CmdLak"));
-        f.Child<QLineEdit>("TxtRemark").setFocus();
-        QTest::keyClick(&f.Child<QLineEdit>("TxtRemark"), Qt::Key_Return);
-        QCOMPARE(f.Ui().Texts(), QStringList{u"חובה לבחור לקוח / תיק רלוונטים לתיוק המסמך"_s});
     }
 };
 
