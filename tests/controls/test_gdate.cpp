@@ -63,7 +63,6 @@ class TestGDate : public QObject {
     void restoreDecidesWhatStays();
     void invalidCharacterRaisesInvalidInput();
     void keyPressHandlerCancelsOrChanges();
-    void keyDownHandlerCancelsKey();
     void enterWithGoodDateReachesDefaultButton();
     void todayButton();
     void functionKeys();
@@ -76,7 +75,6 @@ class TestGDate : public QObject {
     void captionFollowsRatio();
     void selectOnEntry_data();
     void selectOnEntry();
-    void mouseRelayInTwips();
 
   private:
     std::unique_ptr<test::TestEnv> env_;
@@ -255,20 +253,6 @@ void TestGDate::keyPressHandlerCancelsOrChanges() {
     QCOMPARE(seen, u"0x1y07z2020"_s);
     QCOMPARE(input.count(), 0);
     QCOMPARE(g.Text(), u"01-08-2020"_s);
-}
-
-void TestGDate::keyDownHandlerCancelsKey() {
-    GDate g;
-    g.SetValue(QDate(2020, 1, 1));
-    int16_t seenCode = 0;
-    connect(&g, &GDate::KeyDown, this, [&](int16_t& code, int16_t& shift) {
-        seenCode = code;
-        QCOMPARE(shift, int16_t(1));
-        code = 0;
-    });
-    QTest::keyClick(&EditOf(g), Qt::Key_F3, Qt::ShiftModifier);
-    QCOMPARE(seenCode, int16_t(114));
-    QCOMPARE(g.date(), QDate(2020, 1, 1));
 }
 
 void TestGDate::enterWithGoodDateReachesDefaultButton() {
@@ -450,25 +434,6 @@ void TestGDate::selectOnEntry() {
     } else {
         QCOMPARE(edit.selectedText(), u"08-07-2023"_s);
     }
-}
-
-void TestGDate::mouseRelayInTwips() {
-    GDate g;
-    g.resize(150, 20);
-    g.show();
-    float x = 0;
-    float y = 0;
-    int16_t button = 0;
-    connect(&g, &GDate::MouseDown, this, [&](int16_t& b, int16_t&, float& px, float& py) {
-        button = b;
-        x = px;
-        y = py;
-    });
-    QLineEdit& edit = EditOf(g);
-    QTest::mouseClick(&edit, Qt::LeftButton, {}, QPoint(10, 5));
-    QCOMPARE(button, int16_t(1));
-    QCOMPARE(x, 150.0f);
-    QCOMPARE(y, 75.0f);
 }
 
 QTEST_MAIN(TestGDate)
