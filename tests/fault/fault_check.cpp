@@ -7,9 +7,9 @@
 namespace zv::test {
 namespace {
 
-int RowCount(const FilingFixture& f, const QString& database, const QString& table) {
+qsizetype RowCount(const QString& database, const QString& table) {
     try {
-        return f.Rows(database, QStringLiteral("SELECT * FROM ") + table).size();
+        return Rows(database, QStringLiteral("SELECT * FROM ") + table).size();
     } catch (const std::exception&) {
         return -1;
     }
@@ -17,8 +17,8 @@ int RowCount(const FilingFixture& f, const QString& database, const QString& tab
 
 }  // namespace
 
-InstallationState StateOf(const FilingFixture& f) {
-    InstallationState s;
+QStringList StateOf(const FilingFixture& f) {
+    QStringList files;
     const QDir root(f.DataDir());
     QDirIterator it(f.DataDir(), QDir::Files | QDir::Hidden | QDir::System,
                     QDirIterator::Subdirectories);
@@ -27,14 +27,13 @@ InstallationState StateOf(const FilingFixture& f) {
         // Documents are compared with their size; databases only by name, as reading them
         // may not change them but a failed write may leave them another size.
         const QString rel = root.relativeFilePath(path);
-        s.files << (rel.startsWith(QLatin1String("DOCS/"))
-                        ? rel + QLatin1Char(' ') + QString::number(QFileInfo(path).size())
-                        : rel);
+        files << (rel.startsWith(QLatin1String("DOCS/"))
+                      ? rel + QLatin1Char(' ') + QString::number(QFileInfo(path).size())
+                      : rel);
     }
-    s.files.sort();
-    s.docs = RowCount(f, QStringLiteral("MDOCS"), QStringLiteral("DOCS"));
-    s.memos = RowCount(f, QStringLiteral("BM"), QStringLiteral("UMEMO"));
-    return s;
+    files.sort();
+    return files << QStringLiteral("DOCS rows: %1").arg(RowCount("MDOCS", "DOCS"))
+                 << QStringLiteral("UMEMO rows: %1").arg(RowCount("BM", "UMEMO"));
 }
 
 }  // namespace zv::test

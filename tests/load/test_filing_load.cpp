@@ -110,7 +110,7 @@ void TestFilingLoad::everyDocumentFiledOnce() {
         QVERIFY2(!ids.contains(id), qPrintable(QString::number(id)));
         ids.insert(id);
         names << row.value(QStringLiteral("FULLNAME")).toString();
-        const QList<QVariantMap> memos = fx->Rows(
+        const QList<QVariantMap> memos = test::Rows(
             QStringLiteral("BM"),
             QStringLiteral("SELECT METAPEL, MTYPE, MEMOTIME FROM UMEMO WHERE ID=%1").arg(id));
         QStringList got;

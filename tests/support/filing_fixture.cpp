@@ -15,8 +15,6 @@
 #include <QUuid>
 #include <stdexcept>
 
-#include "data/database.h"
-#include "data/recordset.h"
 #include "filing/filing_request_handler.h"
 #include "sample_install/sample_install.h"
 #include "sample_install/test_server.h"
@@ -36,19 +34,6 @@ bool WriteFile(const QString& path, const QByteArray& content) {
     return f.open(QIODevice::WriteOnly) && f.write(content) == content.size();
 }
 
-bool OnServer(const QString& database) {
-    if (database == QLatin1String("MDOCS")) {
-        return IsDocs();
-    }
-    if (database == QLatin1String("BM")) {
-        return IsBM();
-    }
-    if (database == QLatin1String("OFFICE")) {
-        return IsOffice();
-    }
-    return database == QLatin1String("ZORVA") && IsZorva();
-}
-
 bool SetImmutable(const QString& path, bool on) {
     const int fd = ::open(QFile::encodeName(path).constData(), O_RDONLY | O_NONBLOCK);
     if (fd < 0) {
@@ -66,17 +51,24 @@ bool SetImmutable(const QString& path, bool on) {
 
 }  // namespace
 
-FilingFixture::FilingFixture(bool server) {
+FilingFixture::FilingFixture(bool docsOnServer, bool bmOnServer) {
     SampleOptions options;
-    if (server) {
+    if (docsOnServer || bmOnServer) {
         // One client number per process, so that tests replace the same server databases.
         static const SampleOptions serverOptions = TestServerOptions();
         options = serverOptions;
         if (options.serverDataSource.isEmpty()) {
             throw std::runtime_error("no PostgreSQL test cluster: the test needs the pg fixture");
         }
+        options.onServerDocs = docsOnServer;
+        options.onServerBM = bmOnServer;
     }
     CreateSampleInstallation(env_.DataDir(), options);
+    // The programs started on it say nothing about a missing runtime folder.
+    const QString runtime = env_.Root() + QStringLiteral("/runtime");
+    QDir().mkpath(runtime);
+    QFile::setPermissions(runtime, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    qputenv("XDG_RUNTIME_DIR", runtime.toUtf8());
     // The values start-up sets, for reading the rows back in this process.
     SetBasicParam();
     GetMSSQLParam();
@@ -145,21 +137,12 @@ ProcessResult FilingFixture::RunProgram(const QStringList& args) const {
     return r;
 }
 
-QList<QVariantMap> FilingFixture::Rows(const QString& database, const QString& sql) const {
-    auto db = Database::Open(database, OnServer(database));
-    auto rs = db->OpenRecordset(sql, dbOpenSnapshot);
-    QList<QVariantMap> rows;
-    for (; rs->RecordCount() > 0 && !rs->EOF(); rs->MoveNext()) {
-        QVariantMap row;
-        for (int i = 0; i < rs->FieldCount(); ++i) {
-            row.insert(rs->FieldName(i).toUpper(), rs->Value(rs->FieldName(i)));
-        }
-        rows << row;
-    }
-    return rows;
+QString FullName(const QString& relPath) {
+    return QStringLiteral("\\DOCS\\") +
+           QString(relPath).replace(QLatin1Char('/'), QLatin1Char('\\'));
 }
 
-QList<QVariantMap> FilingFixture::DocsRows() const {
+QList<QVariantMap> FilingFixture::DocsRows() {
     return Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT * FROM DOCS ORDER BY FULLNAME"));
 }
 

@@ -16,14 +16,14 @@ class FrmSaveAs;
 namespace zv::test {
 
 struct DialogInput {
-    bool confirm = true;          // false: closed with the close box
-    QString client;               // chosen through the client button
-    QString tik;                  // empty: no case; otherwise chosen through the case button
-    std::optional<QString> name;  // typed into the name box; none keeps the proposal
-    QString description;
-    QString remark;
+    bool confirm = true;            // false: closed with the close box
+    QString client{};               // chosen through the client button
+    QString tik{};                  // empty: no case; otherwise chosen through the case button
+    std::optional<QString> name{};  // typed into the name box; none keeps the proposal
+    QString description{};
+    QString remark{};
     bool reminder = false;
-    QString reminderTime;
+    QString reminderTime{};
     bool popup = false;
 };
 

@@ -10,6 +10,7 @@
 #include <QVariantMap>
 
 #include "scripted_ui.h"
+#include "table_rows.h"
 #include "test_env.h"
 
 namespace zv::test {
@@ -23,7 +24,9 @@ struct ProcessResult {
 class FilingFixture {
   public:
     // server: the installation's four server databases on the pg fixture's cluster.
-    explicit FilingFixture(bool server = false);
+    explicit FilingFixture(bool server = false) : FilingFixture(server, server) {}
+    // The documents and the reminders each on the server or in a file database.
+    FilingFixture(bool docsOnServer, bool bmOnServer);
     ~FilingFixture();
     FilingFixture(const FilingFixture&) = delete;
     FilingFixture& operator=(const FilingFixture&) = delete;
@@ -31,7 +34,7 @@ class FilingFixture {
     // A source document in the inbox, holding content.
     QString Source(const QString& fileName, const QByteArray& content = "document") const;
     // A file below MainPath/DOCS ("DOC1001/x.pdf"), folders created.
-    QString ArchiveFile(const QString& relPath, const QByteArray& content) const;
+    QString ArchiveFile(const QString& relPath, const QByteArray& content = "document") const;
     QString Docs() const;
     QString DataDir() const { return env_.DataDir(); }
 
@@ -43,11 +46,8 @@ class FilingFixture {
     // Runs the built program with these arguments.
     ProcessResult RunProgram(const QStringList& args) const;
 
-    // Rows of a query on a logical database where the installation keeps it, each a map from
-    // the upper-case column name to its value.
-    QList<QVariantMap> Rows(const QString& database, const QString& sql) const;
     // The DOCS rows, by FULLNAME.
-    QList<QVariantMap> DocsRows() const;
+    static QList<QVariantMap> DocsRows();
     // A statement on the file database MainPath/NAME.MDB.
     void ExecFile(const QString& database, const QString& sql) const;
 
@@ -59,6 +59,9 @@ class FilingFixture {
     TestEnv env_;
     ScopedScriptedUi ui_;
 };
+
+// The FULLNAME stored for a path below DOCS ("DOC1001/x.pdf").
+QString FullName(const QString& relPath);
 
 // File content, or a null array when the file cannot be read.
 QByteArray Content(const QString& path);
