@@ -4,7 +4,6 @@
 // was reported; messages go to standard error.
 #include <QCoreApplication>
 #include <QFileInfo>
-#include <cstdio>
 #include <iostream>
 #include <string>
 
@@ -16,7 +15,6 @@ int main(int argc, char** argv) {
     QCoreApplication app(argc, argv);
     const QStringList args = QCoreApplication::arguments();
     if (args.size() != 3) {
-        std::cerr << "usage: record_one_document MAINPATH FILE\n";
         return 2;
     }
     zv::SetMainPath(args[1]);

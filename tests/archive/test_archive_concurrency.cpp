@@ -5,35 +5,21 @@
 #include <memory>
 #include <vector>
 
-#include "archive_install.h"
 #include "data/database.h"
+#include "filing_fixture.h"
 
 using namespace zv;
 
-namespace {
-
 constexpr int kProcesses = 12;
-
-}  // namespace
 
 class TestArchiveConcurrency : public QObject {
     Q_OBJECT
   private Q_SLOTS:
-    void everyFilingGetsItsRow_data();
     void everyFilingGetsItsRow();
 };
 
-void TestArchiveConcurrency::everyFilingGetsItsRow_data() {
-    QTest::addColumn<bool>("holdWriteLock");
-    QTest::newRow("all at once") << false;
-    // Every process reads the same max(ID) while another writer holds the file, so all but
-    // one find their identifier taken when they save.
-    QTest::newRow("behind a writer") << true;
-}
-
 void TestArchiveConcurrency::everyFilingGetsItsRow() {
-    QFETCH(bool, holdWriteLock);
-    test::ArchiveInstall in(false, false);
+    test::FilingFixture f;
     const QString helper =
         QCoreApplication::applicationDirPath() + QStringLiteral("/record_one_document");
     QVERIFY(QFileInfo::exists(helper));
@@ -42,9 +28,9 @@ void TestArchiveConcurrency::everyFilingGetsItsRow() {
     std::vector<std::unique_ptr<QProcess>> processes;
     for (int i = 0; i < kProcesses; ++i) {
         names << QStringLiteral("doc-%1.pdf").arg(i);
-        const QString path = in.MakeFile(QStringLiteral("DOCS/MAILIN/") + names.back());
+        const QString path = f.ArchiveFile(QStringLiteral("MAILIN/") + names.back());
         auto p = std::make_unique<QProcess>();
-        p->start(helper, {in.MainDir(), path});
+        p->start(helper, {f.DataDir(), path});
         QVERIFY2(p->waitForStarted(10000), qPrintable(p->errorString()));
         processes.push_back(std::move(p));
     }
@@ -55,20 +41,17 @@ void TestArchiveConcurrency::everyFilingGetsItsRow() {
         QCOMPARE(p->readLine().trimmed(), QByteArray("ready"));
     }
 
-    std::unique_ptr<Database> writer;
-    if (holdWriteLock) {
-        writer = Database::OpenFile(QStringLiteral("\\MDOCS.MDB"));
-        writer->Execute(QStringLiteral("BEGIN IMMEDIATE"));
-    }
+    // Every process reads the same max(ID) while another writer holds the file, so all but
+    // one find their identifier taken when they save.
+    auto writer = Database::OpenFile(QStringLiteral("\\MDOCS.MDB"));
+    writer->Execute(QStringLiteral("BEGIN IMMEDIATE"));
     for (auto& p : processes) {
         p->write("go\n");
         p->waitForBytesWritten(1000);
     }
-    if (writer) {
-        QTest::qWait(1500);
-        writer->Execute(QStringLiteral("ROLLBACK"));
-        writer.reset();
-    }
+    QTest::qWait(1500);
+    writer->Execute(QStringLiteral("ROLLBACK"));
+    writer.reset();
     for (auto& p : processes) {
         QVERIFY(p->waitForFinished(60000));
         const QByteArray why = "filing of " + p->arguments().last().toUtf8() +
@@ -76,8 +59,8 @@ void TestArchiveConcurrency::everyFilingGetsItsRow() {
         QVERIFY2(p->exitStatus() == QProcess::NormalExit && p->exitCode() == 0, why.constData());
     }
 
-    const auto rows = in.Rows(QStringLiteral("MDOCS"),
-                              QStringLiteral("SELECT ID, ShortName FROM DOCS ORDER BY ID"));
+    const auto rows = test::Rows(QStringLiteral("MDOCS"),
+                                 QStringLiteral("SELECT ID, ShortName FROM DOCS ORDER BY ID"));
     QSet<qint64> ids;
     QStringList filed;
     for (const auto& row : rows) {
@@ -88,8 +71,8 @@ void TestArchiveConcurrency::everyFilingGetsItsRow() {
         filed << row[QStringLiteral("SHORTNAME")].toString();
         // Each document's reminders (pop-up and regular for its one handler) carry its ID.
         const auto memos =
-            in.Rows(QStringLiteral("BM"),
-                    QStringLiteral("SELECT METAPEL FROM UMEMO WHERE ID=") + QString::number(id));
+            test::Rows(QStringLiteral("BM"),
+                       QStringLiteral("SELECT METAPEL FROM UMEMO WHERE ID=") + QString::number(id));
         QCOMPARE(memos.size(), 2);
         QCOMPARE(memos.front()[QStringLiteral("METAPEL")].toString() + QStringLiteral(".pdf"),
                  filed.back());

@@ -7,23 +7,23 @@
 #include "archive/memo.h"
 #include "archive/next_doc_id.h"
 #include "archive/remark.h"
-#include "archive_install.h"
 #include "data/database.h"
 #include "data/recordset.h"
 #include "data/values.h"
+#include "filing_fixture.h"
 #include "sample_install/test_server.h"
-#include "scripted_ui.h"
 #include "util/clock.h"
 #include "util/state.h"
 
 using namespace zv;
+using namespace zv::test;
 
 namespace {
 
 constexpr bool kServer = ZV_ARCHIVE_ON_SERVER;
 
 const QDateTime kNow(QDate(2026, 12, 6), QTime(21, 15, 42));
-const QString kLetter = QStringLiteral("DOCS/DOCBASIC/מכתבים/letter.docx");
+const QString kLetter = QStringLiteral("DOCBASIC/מכתבים/letter.docx");
 
 DocDetails FullDetails() {
     DocDetails d;
@@ -64,30 +64,24 @@ QString Text(const QVariant& v) {
     }
 }
 
-// "\DOCS\...\name" as the suite stores a path below MainPath.
-QString Stored(const QString& relPath) {
-    return QLatin1Char('\\') + QString(relPath).replace(QLatin1Char('/'), QLatin1Char('\\'));
+QList<QVariantMap> DocRows(const QString& relPath) {
+    return Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT * FROM DOCS WHERE FULLNAME='") +
+                                             FixQuote(FullName(relPath)) + QLatin1Char('\''));
 }
 
-QList<QVariantMap> DocRows(const test::ArchiveInstall& in, const QString& relPath) {
-    return in.Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT * FROM DOCS WHERE FULLNAME='") +
-                                                FixQuote(Stored(relPath)) + QLatin1Char('\''));
+QVariant IdOf(const QString& relPath) {
+    return DocRows(relPath).value(0).value(QStringLiteral("ID"));
 }
 
-QVariantMap DocRow(const test::ArchiveInstall& in, const QString& relPath) {
-    const auto rows = DocRows(in, relPath);
-    return rows.size() == 1 ? rows.front() : QVariantMap();
-}
-
-QList<QVariantMap> Memos(const test::ArchiveInstall& in, const QVariant& id) {
-    return in.Rows(QStringLiteral("BM"), QStringLiteral("SELECT * FROM UMEMO WHERE ID=") +
-                                             id.toString() + QStringLiteral(" ORDER BY MemoNum"));
+QList<QVariantMap> Memos(const QVariant& id) {
+    return Rows(QStringLiteral("BM"), QStringLiteral("SELECT * FROM UMEMO WHERE ID=") +
+                                          id.toString() + QStringLiteral(" ORDER BY MemoNum"));
 }
 
 // "handler/MTYPE/RTYPE" of each reminder row, in the order written.
-QStringList MemoKinds(const QList<QVariantMap>& memos) {
+QStringList MemoKinds(const QVariant& id) {
     QStringList out;
-    for (const auto& m : memos) {
+    for (const auto& m : Memos(id)) {
         out << Text(m[QStringLiteral("METAPEL")]) + QLatin1Char('/') +
                    Text(m[QStringLiteral("MTYPE")]) + QLatin1Char('/') +
                    Text(m[QStringLiteral("RTYPE")]);
@@ -95,9 +89,9 @@ QStringList MemoKinds(const QList<QVariantMap>& memos) {
     return out;
 }
 
-qint64 MaxDocId(const test::ArchiveInstall& in) {
+qint64 MaxDocId() {
     const auto rows =
-        in.Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT max(ID) AS M FROM DOCS"));
+        Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT max(ID) AS M FROM DOCS"));
     return rows.front()[QStringLiteral("M")].toLongLong();
 }
 
@@ -107,29 +101,21 @@ class TestDocsRow : public QObject {
     Q_OBJECT
   private Q_SLOTS:
     void initTestCase();
-    void init();
-    void cleanup();
-    void newRow_data();
     void newRow();
     void refiling_data();
     void refiling();
-    void reminderColumns_data();
-    void reminderColumns();
-    void memoRows_data();
-    void memoRows();
+    void reminders_data();
+    void reminders();
     void untickRemovesOnlyOwnReminders();
     void idReadingZeroIsReported();
-    void onlyDocumentRowsHaveReminders();
     void missingFileWritesNothing();
-    void failedColumnIsReportedAndRowSaved();
-    void failedReminderColumnIsReported();
+    void missingColumn_data();
+    void missingColumn();
     void identifiers();
     void otherDuplicateEndsSilently();
-    void backEndsChosenApart_data();
     void backEndsChosenApart();
 
   private:
-    std::unique_ptr<test::ScopedScriptedUi> ui_;
 };
 
 void TestDocsRow::initTestCase() {
@@ -139,108 +125,48 @@ void TestDocsRow::initTestCase() {
     }
 }
 
-void TestDocsRow::init() {
-    ui_ = std::make_unique<test::ScopedScriptedUi>();
-}
-
-void TestDocsRow::cleanup() {
-    ui_.reset();
-    SetClock({});
-}
-
-void TestDocsRow::newRow_data() {
-    QTest::addColumn<bool>("loaded");
-    QTest::newRow("dialog loaded") << true;
-    QTest::newRow("no dialog") << false;
-}
-
 void TestDocsRow::newRow() {
-    QFETCH(bool, loaded);
-    test::ArchiveInstall in(kServer, kServer);
+    FilingFixture f(kServer);
     SetClock([] { return kNow; });
-    const qint64 maxBefore = MaxDocId(in);
-    const QString path = in.MakeFile(kLetter);
-    const DocDetails details = FullDetails();
+    const qint64 maxBefore = MaxDocId();
+    const DocDetails d = FullDetails();
 
-    QVERIFY(AddDocToListByAddIn(path, loaded ? &details : nullptr));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(kLetter), &d));
 
-    QVERIFY((*ui_)->Texts().isEmpty());
-    const QVariantMap row = DocRow(in, kLetter);
-    QVERIFY(!row.isEmpty());
+    QVERIFY(f.Ui().Texts().isEmpty());
+    const QVariantMap row = DocRows(kLetter).value(0);
     QCOMPARE(row[QStringLiteral("ID")].toLongLong(), maxBefore + 1);
     const QString user = MyUserName();
-    QMap<QString, QString> expected{
-        {"FULLNAME", QStringLiteral("\\DOCS\\DOCBASIC\\מכתבים\\letter.docx")},
-        {"SHORTNAME", QStringLiteral("letter.docx")},
-        {"DIRPATH", QStringLiteral("\\DOCS\\DOCBASIC\\מכתבים\\")},
-        {"DIRMONE", "0"},
-        {"SOURCE", "9"},
-    };
-    if (loaded) {
-        expected.insert({
-            {"ISMEMO", "0"},
-            {"DATECREATED", "2026-11-30 00:00:00"},
-            {"METAPEL", details.handlers},
-            {"TEUR", details.description},
-            {"SECTEUR", details.moreDescription},
-            {"MEMODATE", "2026-12-20 00:00:00"},
-            {"MEMOHOUR", "09:30"},
-            {"ISJUMPMEMO", "1"},
-            {"RECIEVEDATE", "2026-12-01 00:00:00"},
-            {"LASTMODIFICATIONTIME", "2026-12-06 21:15:42"},
-            {"LASTMODIFICATIONUSER", user},
-            {"BODY", RemarkStamp(kNow, user) + QStringLiteral(" -- ") + details.remark},
-            {"PARTOF", "3"},
-            {"STATUS", "4"},
-            {"CLIENT_NUM", "1001"},
-            {"SUG", "N"},
-            {"IDTIK", "7"},
-            {"TIK", "55"},
-            {"NUM", "C-9"},
-        });
-    } else {
-        expected.insert({
-            {"ISMEMO", "1"},
-            {"METAPEL", user},
-            {"TEUR", ""},
-            {"SECTEUR", ""},
-            {"MEMODATE", "<null>"},
-            {"MEMOHOUR", "<null>"},
-            {"RECIEVEDATE", "<null>"},
-            {"LASTMODIFICATIONTIME", "<null>"},
-            {"BODY", "<null>"},
-            {"PARTOF", "0"},
-            {"STATUS", "2"},
-            {"CLIENT_NUM", "<null>"},
-            {"SUG", "<null>"},
-            {"TIK", "<null>"},
-            {"NUM", "<null>"},
-        });
-        // Without a dialog the creation time is the file's own.
-        const QDateTime created = StoredDateTime(row[QStringLiteral("DATECREATED")]);
-        QVERIFY2(qAbs(created.secsTo(QDateTime::currentDateTime())) < 120,
-                 qPrintable(Text(row[QStringLiteral("DATECREATED")])));
+    const QStringList expected =
+        (QStringLiteral("FULLNAME=\\DOCS\\DOCBASIC\\מכתבים\\letter.docx|SHORTNAME=letter.docx|"
+                        "DIRPATH=\\DOCS\\DOCBASIC\\מכתבים\\|DIRMONE=0|SOURCE=9|ISMEMO=0|"
+                        "DATECREATED=2026-11-30 00:00:00|METAPEL=דנה כהן;יוסי לוי|"
+                        "TEUR=מכתב ללקוח|SECTEUR=עותק שני|MEMODATE=2026-12-20 00:00:00|"
+                        "MEMOHOUR=09:30|ISJUMPMEMO=1|RECIEVEDATE=2026-12-01 00:00:00|"
+                        "LASTMODIFICATIONTIME=2026-12-06 21:15:42|PARTOF=3|STATUS=4|"
+                        "CLIENT_NUM=1001|SUG=N|IDTIK=7|TIK=55|NUM=C-9|LASTMODIFICATIONUSER=") +
+         user + QStringLiteral("|BODY=") + RemarkStamp(kNow, user) +
+         QStringLiteral(" -- נשלח בדואר"))
+            .split(QLatin1Char('|'));
+    for (const QString& column : expected) {
+        const QString name = column.section(QLatin1Char('='), 0, 0);
+        QVERIFY2(row.contains(name), qPrintable(name));
+        QCOMPARE(name + QLatin1Char('=') + Text(row[name]), column);
     }
-    for (auto it = expected.cbegin(); it != expected.cend(); ++it) {
-        QVERIFY2(row.contains(it.key()), qPrintable(it.key()));
-        QCOMPARE(Text(row[it.key()]), it.value());
-    }
-    const auto memos = Memos(in, row[QStringLiteral("ID")]);
-    QCOMPARE(memos.size(), loaded ? 4 : 0);
 }
 
 void TestDocsRow::refiling_data() {
     QTest::addColumn<QString>("relPath");
     QTest::newRow("plain name") << kLetter;
-    QTest::newRow("apostrophe") << QStringLiteral("DOCS/DOCBASIC/חוזים/O'Brien's deal.pdf");
+    QTest::newRow("apostrophe") << QStringLiteral("DOCBASIC/חוזים/O'Brien's deal.pdf");
 }
 
 // Filing to a path that has a row updates it: one row, its ID kept, the remarks kept in
 // order under lines of dashes; a remark of blanks adds nothing.
 void TestDocsRow::refiling() {
     QFETCH(QString, relPath);
-    test::ArchiveInstall in(kServer, kServer);
-    const QString path = in.MakeFile(relPath);
+    FilingFixture f(kServer);
+    const QString path = f.ArchiveFile(relPath);
     DocDetails d = FullDetails();
     const QDateTime first(QDate(2026, 12, 6), QTime(9, 0, 1));
     const QDateTime second(QDate(2026, 12, 7), QTime(17, 30, 2));
@@ -248,7 +174,7 @@ void TestDocsRow::refiling() {
     SetClock([&] { return first; });
     d.remark = QStringLiteral("ראשון");
     QVERIFY(AddDocToListByAddIn(path, &d));
-    const QVariant id = DocRow(in, relPath)[QStringLiteral("ID")];
+    const QVariant id = IdOf(relPath);
     SetClock([&] { return second; });
     d.remark = QStringLiteral("שני");
     d.description = QStringLiteral("תיאור חדש");
@@ -256,12 +182,11 @@ void TestDocsRow::refiling() {
     d.remark = QStringLiteral("   ");
     QVERIFY(AddDocToListByAddIn(path, &d));
 
-    QVERIFY((*ui_)->Texts().isEmpty());
-    const auto rows = DocRows(in, relPath);
+    QVERIFY(f.Ui().Texts().isEmpty());
+    const auto rows = DocRows(relPath);
     QCOMPARE(rows.size(), 1);
     const QVariantMap& row = rows.front();
     QCOMPARE(row[QStringLiteral("ID")], id);
-    QCOMPARE(row[QStringLiteral("FULLNAME")].toString(), Stored(relPath));
     QCOMPARE(row[QStringLiteral("TEUR")].toString(), d.description);
     const QString user = MyUserName();
     QCOMPARE(row[QStringLiteral("BODY")].toString(),
@@ -270,104 +195,71 @@ void TestDocsRow::refiling() {
                  RemarkStamp(second, user) + QStringLiteral(" -- שני"));
 }
 
-void TestDocsRow::reminderColumns_data() {
+void TestDocsRow::reminders_data() {
+    QTest::addColumn<QString>("handlers");
     QTest::addColumn<bool>("reminder");
     QTest::addColumn<QDate>("date");
     QTest::addColumn<QString>("time");
     QTest::addColumn<bool>("popup");
-    QTest::addColumn<QStringList>("expected");  // IsMemo, MemoDate, MemoHour, IsJumpMemo
-    QTest::addColumn<int>("memoRows");
+    QTest::addColumn<QStringList>("columns");  // IsMemo, MemoDate, MemoHour, IsJumpMemo
+    QTest::addColumn<QStringList>("memos");    // handler/MTYPE/RTYPE
+    QTest::addColumn<QDateTime>("moment");     // of every reminder row
 
     const QDate day(2026, 12, 20);
     const QString midnight = QStringLiteral("2026-12-20 00:00:00");
-    QTest::newRow("off") << false << day << QStringLiteral("10:00") << true
-                         << QStringList{"1", "<null>", "<null>", "0"} << 0;
-    QTest::newRow("on") << true << day << QStringLiteral("10:00") << false
-                        << QStringList{"0", midnight, "10:00", "0"} << 1;
+    const QDateTime at(day, QTime(10, 0));
+    QTest::newRow("off") << "A" << false << day << "10:00" << true
+                         << QStringList{"1", "<null>", "<null>", "0"} << QStringList{} << at;
+    QTest::newRow("on") << "A" << true << day << "10:00" << false
+                        << QStringList{"0", midnight, "10:00", "0"} << QStringList{"A/32/3"} << at;
     QTest::newRow("empty time is 08:00")
-        << true << day << QString() << false << QStringList{"0", midnight, "08:00", "0"} << 1;
-    QTest::newRow("empty time mask is 08:00") << true << day << QStringLiteral("__:__") << true
-                                              << QStringList{"0", midnight, "08:00", "1"} << 2;
-    QTest::newRow("one-digit hour") << true << day << QStringLiteral("7:05") << false
-                                    << QStringList{"0", midnight, "07:05", "0"} << 1;
+        << "A" << true << day << QString() << false << QStringList{"0", midnight, "08:00", "0"}
+        << QStringList{"A/32/3"} << QDateTime(day, QTime(8, 0));
+    QTest::newRow("empty time mask is 08:00")
+        << "A" << true << day << "__:__" << false << QStringList{"0", midnight, "08:00", "0"}
+        << QStringList{"A/32/3"} << QDateTime(day, QTime(8, 0));
     QTest::newRow("empty date box is the zero date")
-        << true << QDate() << QStringLiteral("10:00") << true
-        << QStringList{"0", "1899-12-30 00:00:00", "10:00", "1"} << 0;
+        << "A" << true << QDate() << "10:00" << true
+        << QStringList{"0", "1899-12-30 00:00:00", "10:00", "1"} << QStringList{} << at;
+    QTest::newRow("two handlers, pop-up first")
+        << "A;B" << true << day << "10:00" << true << QStringList{"0", midnight, "10:00", "1"}
+        << QStringList{"A/31/2", "B/31/2", "A/32/3", "B/32/3"} << at;
+    QTest::newRow("trailing separator gives an empty handler")
+        << "A;" << true << day << "10:00" << true << QStringList{"0", midnight, "10:00", "1"}
+        << QStringList{"A/31/2", "/31/2", "A/32/3", "/32/3"} << at;
+    QTest::newRow("24:30 is the next day")
+        << "A" << true << day << "24:30" << false << QStringList{"0", midnight, "24:30", "0"}
+        << QStringList{"A/32/3"} << QDateTime(QDate(2026, 12, 21), QTime(0, 30));
 }
 
-void TestDocsRow::reminderColumns() {
+void TestDocsRow::reminders() {
+    QFETCH(QString, handlers);
     QFETCH(bool, reminder);
     QFETCH(QDate, date);
     QFETCH(QString, time);
     QFETCH(bool, popup);
-    QFETCH(QStringList, expected);
-    QFETCH(int, memoRows);
-    test::ArchiveInstall in(kServer, kServer);
+    QFETCH(QStringList, columns);
+    QFETCH(QStringList, memos);
+    QFETCH(QDateTime, moment);
+    FilingFixture f(kServer);
+    SetClock([] { return kNow; });
     DocDetails d = FullDetails();
-    d.handlers = QStringLiteral("דנה כהן");
+    d.handlers = handlers;
     d.reminder = reminder;
     d.reminderDate = date;
     d.reminderTime = time;
     d.popup = popup;
 
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(kLetter), &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(kLetter), &d));
 
-    const QVariantMap row = DocRow(in, kLetter);
+    QVERIFY(f.Ui().Texts().isEmpty());
+    const QVariantMap row = DocRows(kLetter).value(0);
     const QStringList got{
         Text(row[QStringLiteral("ISMEMO")]), Text(row[QStringLiteral("MEMODATE")]),
         Text(row[QStringLiteral("MEMOHOUR")]), Text(row[QStringLiteral("ISJUMPMEMO")])};
-    QCOMPARE(got, expected);
-    QCOMPARE(Memos(in, row[QStringLiteral("ID")]).size(), memoRows);
-    QVERIFY((*ui_)->Texts().isEmpty());
-}
-
-void TestDocsRow::memoRows_data() {
-    QTest::addColumn<QString>("handlers");
-    QTest::addColumn<bool>("popup");
-    QTest::addColumn<QString>("time");
-    QTest::addColumn<QStringList>("expected");
-    QTest::addColumn<QDateTime>("moment");
-
-    const QDateTime at(QDate(2026, 12, 20), QTime(9, 30));
-    QTest::newRow("two handlers, pop-up first")
-        << QStringLiteral("A;B") << true << QStringLiteral("09:30")
-        << QStringList{"A/31/2", "B/31/2", "A/32/3", "B/32/3"} << at;
-    QTest::newRow("regular only") << QStringLiteral("A;B") << false << QStringLiteral("09:30")
-                                  << QStringList{"A/32/3", "B/32/3"} << at;
-    QTest::newRow("trailing separator gives an empty handler")
-        << QStringLiteral("A;") << true << QStringLiteral("09:30")
-        << QStringList{"A/31/2", "/31/2", "A/32/3", "/32/3"} << at;
-    QTest::newRow("a handler twice is written once")
-        << QStringLiteral("A;A;B") << true << QStringLiteral("09:30")
-        << QStringList{"A/31/2", "B/31/2", "A/32/3", "B/32/3"} << at;
-    QTest::newRow("no handlers, no rows")
-        << QString() << true << QStringLiteral("09:30") << QStringList{} << at;
-    QTest::newRow("24:30 is the next day")
-        << QStringLiteral("A") << false << QStringLiteral("24:30") << QStringList{"A/32/3"}
-        << QDateTime(QDate(2026, 12, 21), QTime(0, 30));
-}
-
-void TestDocsRow::memoRows() {
-    QFETCH(QString, handlers);
-    QFETCH(bool, popup);
-    QFETCH(QString, time);
-    QFETCH(QStringList, expected);
-    QFETCH(QDateTime, moment);
-    test::ArchiveInstall in(kServer, kServer);
-    SetClock([] { return kNow; });
-    DocDetails d = FullDetails();
-    d.handlers = handlers;
-    d.popup = popup;
-    d.reminderTime = time;
-
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(kLetter), &d));
-
-    QVERIFY((*ui_)->Texts().isEmpty());
-    const QVariant id = DocRow(in, kLetter)[QStringLiteral("ID")];
-    QVERIFY(id.toLongLong() > 0);
-    const auto memos = Memos(in, id);
-    QCOMPARE(MemoKinds(memos), expected);
-    for (const auto& m : memos) {
+    QCOMPARE(got, columns);
+    QCOMPARE(MemoKinds(row[QStringLiteral("ID")]), memos);
+    for (const auto& m : Memos(row[QStringLiteral("ID")])) {
         QCOMPARE(m[QStringLiteral("USER97")].toString(), MyUser());
         QCOMPARE(Text(m[QStringLiteral("MEMOTIME")]), Text(moment));
         QCOMPARE(Text(m[QStringLiteral("DATEUPDATED")]), Text(kNow));
@@ -377,182 +269,139 @@ void TestDocsRow::memoRows() {
 // Refiling without a reminder removes the document's pop-up and regular reminders; other
 // kinds of reminder and other documents' reminders stay.
 void TestDocsRow::untickRemovesOnlyOwnReminders() {
-    test::ArchiveInstall in(kServer, kServer);
-    const QString path = in.MakeFile(kLetter);
+    FilingFixture f(kServer);
+    const QString path = f.ArchiveFile(kLetter);
     DocDetails d = FullDetails();
     d.handlers = QStringLiteral("A");
     QVERIFY(AddDocToListByAddIn(path, &d));
-    const QString id = DocRow(in, kLetter)[QStringLiteral("ID")].toString();
+    const QString id = IdOf(kLetter).toString();
     const QString insert = QStringLiteral(
         "INSERT INTO UMEMO (USER97, METAPEL, MTYPE, RTYPE, ID) VALUES ('1', 'A', %1, 2, %2)");
-    in.Execute(QStringLiteral("BM"), insert.arg(QStringLiteral("7"), id));
-    in.Execute(QStringLiteral("BM"), insert.arg(QStringLiteral("31"), QStringLiteral("99999")));
-    QCOMPARE(MemoKinds(Memos(in, id)), (QStringList{"A/31/2", "A/32/3", "A/7/2"}));
+    Execute(QStringLiteral("BM"), insert.arg(QStringLiteral("7"), id));
+    Execute(QStringLiteral("BM"), insert.arg(QStringLiteral("31"), QStringLiteral("99999")));
+    QCOMPARE(MemoKinds(id), (QStringList{"A/31/2", "A/32/3", "A/7/2"}));
 
     d.reminder = false;
     QVERIFY(AddDocToListByAddIn(path, &d));
 
-    QCOMPARE(MemoKinds(Memos(in, id)), QStringList{"A/7/2"});
-    QCOMPARE(MemoKinds(Memos(in, 99999)), QStringList{"A/31/2"});
-    QCOMPARE(Text(DocRow(in, kLetter)[QStringLiteral("ISMEMO")]), QStringLiteral("1"));
-    QVERIFY((*ui_)->Texts().isEmpty());
+    QCOMPARE(MemoKinds(id), QStringList{"A/7/2"});
+    QCOMPARE(MemoKinds(99999), QStringList{"A/31/2"});
+    QCOMPARE(Text(DocRows(kLetter).value(0)[QStringLiteral("ISMEMO")]), QStringLiteral("1"));
+    QVERIFY(f.Ui().Texts().isEmpty());
 }
 
 void TestDocsRow::idReadingZeroIsReported() {
-    test::ArchiveInstall in(kServer, kServer);
-    in.Execute(QStringLiteral("MDOCS"),
-               QStringLiteral("INSERT INTO DOCS (ID, FULLNAME, IsMemo, IsJumpMemo, MemoDate, "
-                              "MemoHour, Metapel) VALUES (0, '\\zero.doc', 0, 1, "
-                              "'2026-12-20 00:00:00', '09:00', 'A')"));
+    FilingFixture f(kServer);
+    Execute(QStringLiteral("MDOCS"),
+            QStringLiteral("INSERT INTO DOCS (ID, FULLNAME, IsMemo, IsJumpMemo, MemoDate, "
+                           "MemoHour, Metapel) VALUES (0, '\\zero.doc', 0, 1, "
+                           "'2026-12-20 00:00:00', '09:00', 'A')"));
     auto db = Database::Open(QStringLiteral("MDOCS"), IsDocs());
     auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE FULLNAME='\\zero.doc'"));
 
     CheckMemo(QStringLiteral("DOCS"), rs.get());
 
-    QCOMPARE((*ui_)->Texts(), QStringList{QStringLiteral("בעיה בקוד זיהוי בטבלה : DOCS")});
-    QCOMPARE((*ui_)->Messages().front().style, int(vbExclamation | vbOKOnly));
-    QVERIFY(Memos(in, 0).isEmpty());
-}
-
-void TestDocsRow::onlyDocumentRowsHaveReminders() {
-    test::ArchiveInstall in(kServer, kServer);
-    DocDetails d = FullDetails();
-    d.handlers = QStringLiteral("A");
-    d.popup = false;
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(kLetter), &d));
-    const QString id = DocRow(in, kLetter)[QStringLiteral("ID")].toString();
-    auto db = Database::Open(QStringLiteral("MDOCS"), IsDocs());
-    auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE ID=") + id);
-    in.Execute(QStringLiteral("BM"), QStringLiteral("DELETE FROM UMEMO"));
-
-    CheckMemo(QStringLiteral("Docs2"), rs.get());
-    QVERIFY(Memos(in, id).isEmpty());
-    CheckMemo(QStringLiteral("docs"), rs.get());
-    QCOMPARE(MemoKinds(Memos(in, id)), QStringList{"A/32/3"});
-    QVERIFY((*ui_)->Texts().isEmpty());
+    QCOMPARE(f.Ui().Texts(), QStringList{QStringLiteral("בעיה בקוד זיהוי בטבלה : DOCS")});
+    QVERIFY(Memos(0).isEmpty());
 }
 
 void TestDocsRow::missingFileWritesNothing() {
-    test::ArchiveInstall in(kServer, kServer);
-    const qint64 before = MaxDocId(in);
+    FilingFixture f(kServer);
+    const qint64 before = MaxDocId();
     const DocDetails d = FullDetails();
-    QVERIFY(!AddDocToListByAddIn(in.MainDir() + QStringLiteral("/DOCS/MAILIN/gone.pdf"), &d));
-    QCOMPARE(MaxDocId(in), before);
-    QVERIFY((*ui_)->Texts().isEmpty());
+    QVERIFY(!AddDocToListByAddIn(f.Docs() + QStringLiteral("/MAILIN/gone.pdf"), &d));
+    QCOMPARE(MaxDocId(), before);
+    QVERIFY(f.Ui().Texts().isEmpty());
 }
 
-// A column the table lacks is reported with the path; the rest of the row is saved.
-void TestDocsRow::failedColumnIsReportedAndRowSaved() {
-    test::ArchiveInstall in(kServer, kServer);
-    in.Execute(QStringLiteral("MDOCS"), QStringLiteral("ALTER TABLE DOCS DROP COLUMN SecTeur"));
-    const QString path = in.MakeFile(kLetter);
-    const DocDetails d = FullDetails();
-
-    QVERIFY(AddDocToListByAddIn(path, &d));
-
-    QCOMPARE((*ui_)->Texts(),
-             QStringList{QStringLiteral("3265-0-AddDocToListByAddIn-Item not found in this "
-                                        "collection. (SecTeur)\r\n") +
-                         path});
-    QCOMPARE((*ui_)->Messages().front().style, int(vbOKOnly));
-    const QVariantMap row = DocRow(in, kLetter);
-    QCOMPARE(row[QStringLiteral("TEUR")].toString(), d.description);
-    QCOMPARE(row[QStringLiteral("NUM")].toString(), d.caseCode);
-    QCOMPARE(Memos(in, row[QStringLiteral("ID")]).size(), 4);
+void TestDocsRow::missingColumn_data() {
+    QTest::addColumn<QString>("database");
+    QTest::addColumn<QString>("statement");
+    QTest::addColumn<QString>("message");  // %1: the file, %2: its ID
+    QTest::newRow("DOCS") << "MDOCS"
+                          << "ALTER TABLE DOCS DROP COLUMN SecTeur"
+                          << "3265-0-AddDocToListByAddIn-Item not found in this collection. "
+                             "(SecTeur)\r\n%1";
+    QTest::newRow("UMEMO")
+        << "BM"
+        << "ALTER TABLE UMEMO DROP COLUMN DateUpdated"
+        << " 3265-CheckMemo-\r\nDOCS-%2\r\nItem not found in this collection. (DateUpdated)";
 }
 
-void TestDocsRow::failedReminderColumnIsReported() {
-    test::ArchiveInstall in(kServer, kServer);
-    in.Execute(QStringLiteral("BM"), QStringLiteral("ALTER TABLE UMEMO DROP COLUMN DateUpdated"));
+// A column a table lacks is reported; the rest of the row and the reminders are saved.
+void TestDocsRow::missingColumn() {
+    QFETCH(QString, database);
+    QFETCH(QString, statement);
+    QFETCH(QString, message);
+    FilingFixture f(kServer);
+    Execute(database, statement);
     DocDetails d = FullDetails();
     d.handlers = QStringLiteral("A");
     d.popup = false;
+    const QString path = f.ArchiveFile(kLetter);
 
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(kLetter), &d));
+    QVERIFY(AddDocToListByAddIn(path, &d));
 
-    const QString id = DocRow(in, kLetter)[QStringLiteral("ID")].toString();
-    QCOMPARE((*ui_)->Texts(),
-             QStringList{QStringLiteral(" 3265-CheckMemo-\r\nDOCS-") + id +
-                         QStringLiteral("\r\nItem not found in this collection. (DateUpdated)")});
-    QCOMPARE(MemoKinds(Memos(in, id)), QStringList{"A/32/3"});
+    const QVariantMap row = DocRows(kLetter).value(0);
+    message.replace(QStringLiteral("%1"), path)
+        .replace(QStringLiteral("%2"), row[QStringLiteral("ID")].toString());
+    QCOMPARE(f.Ui().Texts(), QStringList{message});
+    QCOMPARE(row[QStringLiteral("NUM")].toString(), d.caseCode);
+    QCOMPARE(MemoKinds(row[QStringLiteral("ID")]), QStringList{"A/32/3"});
 }
 
-// The file databases number documents max + 1 (1 in an empty table), also for a row whose
-// ID was never set; on the server the server numbers them and the add-in asks for nothing.
+// The file databases number documents max + 1 (1 in an empty table); on the server the server
+// numbers them and the add-in asks for nothing.
 void TestDocsRow::identifiers() {
-    test::ArchiveInstall in(kServer, kServer);
-    in.Execute(QStringLiteral("MDOCS"), QStringLiteral("DELETE FROM DOCS"));
+    FilingFixture f(kServer);
+    Execute(QStringLiteral("MDOCS"), QStringLiteral("DELETE FROM DOCS"));
     QCOMPARE(GetNextIdDOCS(), kServer ? 0 : 1);
     const DocDetails d = FullDetails();
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(QStringLiteral("DOCS/MAILIN/a.pdf")), &d));
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(QStringLiteral("DOCS/MAILIN/b.pdf")), &d));
-    const qint64 a =
-        DocRow(in, QStringLiteral("DOCS/MAILIN/a.pdf"))[QStringLiteral("ID")].toLongLong();
-    const qint64 b =
-        DocRow(in, QStringLiteral("DOCS/MAILIN/b.pdf"))[QStringLiteral("ID")].toLongLong();
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/a.pdf")), &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/b.pdf")), &d));
+    const qint64 a = IdOf(QStringLiteral("MAILIN/a.pdf")).toLongLong();
     QVERIFY(a > 0);
-    QCOMPARE(b, a + 1);
-    if (!kServer) {
-        QCOMPARE(a, 1);
-        in.Execute(QStringLiteral("MDOCS"),
-                   QStringLiteral("INSERT INTO DOCS (FULLNAME) VALUES ('\\DOCS\\MAILIN\\c.pdf')"));
-        QVERIFY(AddDocToListByAddIn(in.MakeFile(QStringLiteral("DOCS/MAILIN/c.pdf")), &d));
-        QCOMPARE(DocRow(in, QStringLiteral("DOCS/MAILIN/c.pdf"))[QStringLiteral("ID")].toLongLong(),
-                 3);
-        QCOMPARE(GetNextIdDOCS(), 4);
-    }
-    QCOMPARE(Memos(in, b).size(), 4);
-    QVERIFY((*ui_)->Texts().isEmpty());
+    QCOMPARE(IdOf(QStringLiteral("MAILIN/b.pdf")).toLongLong(), a + 1);
+    QVERIFY(kServer || a == 1);
+    QVERIFY(f.Ui().Texts().isEmpty());
 }
 
 // A duplicate in an index other than ID is no identifier race: the filing ends silently,
 // reports that nothing was saved, and takes no second identifier.
 void TestDocsRow::otherDuplicateEndsSilently() {
-    test::ArchiveInstall in(kServer, kServer);
-    in.Execute(QStringLiteral("MDOCS"),
-               QStringLiteral("CREATE UNIQUE INDEX DOCS_SHORTNAME ON DOCS (ShortName)"));
-    const qint64 before = MaxDocId(in);
+    FilingFixture f(kServer);
+    Execute(QStringLiteral("MDOCS"),
+            QStringLiteral("CREATE UNIQUE INDEX DOCS_SHORTNAME ON DOCS (ShortName)"));
+    const qint64 before = MaxDocId();
     const DocDetails d = FullDetails();
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(QStringLiteral("DOCS/MAILIN/same.pdf")), &d));
-    QVERIFY(!AddDocToListByAddIn(in.MakeFile(QStringLiteral("DOCS/DOCBASIC/same.pdf")), &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/same.pdf")), &d));
+    QVERIFY(!AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("DOCBASIC/same.pdf")), &d));
 
-    QVERIFY((*ui_)->Texts().isEmpty());
-    QCOMPARE(DocRows(in, QStringLiteral("DOCS/DOCBASIC/same.pdf")).size(), 0);
-    const auto all =
-        in.Rows(QStringLiteral("MDOCS"),
-                QStringLiteral("SELECT ID FROM DOCS WHERE ID>") + QString::number(before));
-    QCOMPARE(all.size(), 1);
+    QVERIFY(f.Ui().Texts().isEmpty());
+    const auto added =
+        Rows(QStringLiteral("MDOCS"),
+             QStringLiteral("SELECT ID FROM DOCS WHERE ID>") + QString::number(before));
+    QCOMPARE(added.size(), 1);
     if (!kServer) {
         QCOMPARE(GetNextIdDOCS(), before + 2);
     }
 }
 
-void TestDocsRow::backEndsChosenApart_data() {
-    QTest::addColumn<bool>("docsOnServer");
-    QTest::addColumn<bool>("bmOnServer");
-    QTest::newRow("documents here, reminders there") << !kServer << kServer;
-    QTest::newRow("documents there, reminders here") << kServer << !kServer;
-}
-
 // The two flags choose independently; the reminders carry the document's own ID.
 void TestDocsRow::backEndsChosenApart() {
-    QFETCH(bool, docsOnServer);
-    QFETCH(bool, bmOnServer);
     if (!kServer) {
         QSKIP("mixed back-ends need the server; the server build runs them");
     }
-    test::ArchiveInstall in(docsOnServer, bmOnServer);
+    FilingFixture f(true, false);
     const DocDetails d = FullDetails();
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(QStringLiteral("DOCS/MAILIN/first.pdf")), &d));
-    QVERIFY(AddDocToListByAddIn(in.MakeFile(kLetter), &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/first.pdf")), &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(kLetter), &d));
 
-    const QVariant id = DocRow(in, kLetter)[QStringLiteral("ID")];
-    QCOMPARE(MemoKinds(Memos(in, id)).size(), 4);
-    const QVariant firstId =
-        DocRow(in, QStringLiteral("DOCS/MAILIN/first.pdf"))[QStringLiteral("ID")];
-    QVERIFY(firstId != id);
-    QCOMPARE(MemoKinds(Memos(in, firstId)).size(), 4);
-    QVERIFY((*ui_)->Texts().isEmpty());
+    const QVariant first = IdOf(QStringLiteral("MAILIN/first.pdf"));
+    QVERIFY(first != IdOf(kLetter));
+    QCOMPARE(Memos(first).size(), 4);
+    QCOMPARE(Memos(IdOf(kLetter)).size(), 4);
+    QVERIFY(f.Ui().Texts().isEmpty());
 }
 
 QTEST_MAIN(TestDocsRow)
