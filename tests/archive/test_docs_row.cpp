@@ -108,11 +108,10 @@ class TestDocsRow : public QObject {
     void reminders();
     void untickRemovesOnlyOwnReminders();
     void idReadingZeroIsReported();
-    void missingFileWritesNothing();
     void missingColumn_data();
     void missingColumn();
     void identifiers();
-    void otherDuplicateEndsSilently();
+    void notSavedEndsSilently();
     void backEndsChosenApart();
 
   private:
@@ -305,15 +304,6 @@ void TestDocsRow::idReadingZeroIsReported() {
     QVERIFY(Memos(0).isEmpty());
 }
 
-void TestDocsRow::missingFileWritesNothing() {
-    FilingFixture f(kServer);
-    const qint64 before = MaxDocId();
-    const DocDetails d = FullDetails();
-    QVERIFY(!AddDocToListByAddIn(f.Docs() + QStringLiteral("/MAILIN/gone.pdf"), &d));
-    QCOMPARE(MaxDocId(), before);
-    QVERIFY(f.Ui().Texts().isEmpty());
-}
-
 void TestDocsRow::missingColumn_data() {
     QTest::addColumn<QString>("database");
     QTest::addColumn<QString>("statement");
@@ -366,14 +356,15 @@ void TestDocsRow::identifiers() {
     QVERIFY(f.Ui().Texts().isEmpty());
 }
 
-// A duplicate in an index other than ID is no identifier race: the filing ends silently,
-// reports that nothing was saved, and takes no second identifier.
-void TestDocsRow::otherDuplicateEndsSilently() {
+// A filing whose row cannot be saved says so and ends silently: a file that is gone, and a
+// duplicate in an index other than ID, which is no identifier race and takes no second one.
+void TestDocsRow::notSavedEndsSilently() {
     FilingFixture f(kServer);
     Execute(QStringLiteral("MDOCS"),
             QStringLiteral("CREATE UNIQUE INDEX DOCS_SHORTNAME ON DOCS (ShortName)"));
     const qint64 before = MaxDocId();
     const DocDetails d = FullDetails();
+    QVERIFY(!AddDocToListByAddIn(f.Docs() + QStringLiteral("/MAILIN/gone.pdf"), &d));
     QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/same.pdf")), &d));
     QVERIFY(!AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("DOCBASIC/same.pdf")), &d));
 

@@ -10,6 +10,7 @@
 #include "dialog_script.h"
 #include "fault_check.h"
 #include "filing_fixture.h"
+#include "test_files.h"
 
 using namespace zv;
 using namespace zv::test;
@@ -29,25 +30,12 @@ enum Fault {
     ServerIniGarbage,
 };
 
-// Bytes no settings reader can make sense of: random binary with broken INI lines between.
+// Bytes no settings reader can make sense of: random binary, NUL included, and broken INI
+// lines.
 QByteArray Garbage() {
-    QRandomGenerator random(8);
-    QByteArray bytes;
-    for (int i = 0; i < 64 * 64; ++i) {
-        bytes.append(char(random.bounded(256)));
-        if (i % 64 == 63) {
-            bytes.append(i % 192 == 63 ? QByteArray("\n[General\n=\nMainPath\n")
-                                       : QByteArray("\r\n\0\xff[]==\n", 9));
-        }
-    }
-    return bytes;
-}
-
-void WriteGarbage(const QString& path) {
-    QDir().mkpath(QFileInfo(path).path());
-    QFile f(path);
-    QVERIFY(f.open(QIODevice::WriteOnly | QIODevice::Truncate));
-    f.write(Garbage());
+    QByteArray bytes(4096, '\0');
+    QRandomGenerator(8).fillRange(reinterpret_cast<quint32*>(bytes.data()), bytes.size() / 4);
+    return bytes + QByteArray("\n[General\n=\nMainPath\n\r\n\0\xff[]==\n", 30);
 }
 
 }  // namespace
@@ -198,12 +186,14 @@ void TestFaults::batch() {
         f.ExecFile(QStringLiteral("MAIN"),
                    QStringLiteral("INSERT OR REPLACE INTO MSql (ClientID, IsDocs, IsBM, IsOffice, "
                                   "IsZorva) VALUES ('23', 1, 1, 1, 1)"));
-        WriteGarbage(f.DataDir() + QStringLiteral("/Def/MSSQLSetting.INI"));
+        QVERIFY(WriteFile(f.DataDir() + QStringLiteral("/Def/MSSQLSetting.INI"), Garbage()));
     } else {
-        WriteGarbage(qEnvironmentVariable("XDG_CONFIG_HOME") +
-                     QStringLiteral("/zorvane/kavex32.ini"));
-        WriteGarbage(qEnvironmentVariable("LOCALAPPDATA") +
-                     QStringLiteral("/Zorvane/Kavex32R.txt"));
+        QVERIFY(WriteFile(
+            qEnvironmentVariable("XDG_CONFIG_HOME") + QStringLiteral("/zorvane/kavex32.ini"),
+            Garbage()));
+        QVERIFY(WriteFile(
+            qEnvironmentVariable("LOCALAPPDATA") + QStringLiteral("/Zorvane/Kavex32R.txt"),
+            Garbage()));
     }
     const QStringList before = StateOf(f);
 

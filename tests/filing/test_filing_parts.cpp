@@ -9,6 +9,7 @@
 #include "filing/filing_request.h"
 #include "filing_fixture.h"
 #include "startup/command_line.h"
+#include "test_files.h"
 #include "util/errors.h"
 #include "util/state.h"
 #include "util/ui.h"
@@ -17,11 +18,6 @@ using namespace zv;
 using namespace zv::test;
 
 namespace {
-
-void Write(const QString& path, const QByteArray& content) {
-    QFile f(path);
-    QVERIFY(f.open(QIODevice::WriteOnly) && f.write(content) == content.size());
-}
 
 // Files source as the confirmed dialog would, to DOC1001/מסמך with typed in the name box.
 QString FileInto(const FilingFixture& f, int mode, const QString& source, const QString& typed,
@@ -132,7 +128,7 @@ void TestFilingParts::options() {
 void TestFilingParts::failedCopyKeepsEarlierFile() {
     QTemporaryDir dir;
     const QString target = dir.filePath(QStringLiteral("x.pdf"));
-    Write(target, "old");
+    QVERIFY(WriteFile(target, "old"));
     try {
         CopyFileOver(dir.filePath(QStringLiteral("missing.pdf")), target);
         QFAIL("a missing source was copied");

@@ -22,17 +22,12 @@
 #include "startup/main_entry.h"
 #include "startup/request_text.h"
 #include "startup/settings.h"
+#include "test_files.h"
 #include "util/clock.h"
 #include "util/state.h"
 
 namespace zv::test {
 namespace {
-
-bool WriteFile(const QString& path, const QByteArray& content) {
-    QDir().mkpath(QFileInfo(path).path());
-    QFile f(path);
-    return f.open(QIODevice::WriteOnly) && f.write(content) == content.size();
-}
 
 bool SetImmutable(const QString& path, bool on) {
     const int fd = ::open(QFile::encodeName(path).constData(), O_RDONLY | O_NONBLOCK);
