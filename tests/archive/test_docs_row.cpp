@@ -211,9 +211,6 @@ void TestDocsRow::reminders_data() {
                          << QStringList{"1", "<null>", "<null>", "0"} << QStringList{} << at;
     QTest::newRow("on") << "A" << true << day << "10:00" << false
                         << QStringList{"0", midnight, "10:00", "0"} << QStringList{"A/32/3"} << at;
-    QTest::newRow("empty time is 08:00")
-        << "A" << true << day << QString() << false << QStringList{"0", midnight, "08:00", "0"}
-        << QStringList{"A/32/3"} << QDateTime(day, QTime(8, 0));
     QTest::newRow("empty time mask is 08:00")
         << "A" << true << day << "__:__" << false << QStringList{"0", midnight, "08:00", "0"}
         << QStringList{"A/32/3"} << QDateTime(day, QTime(8, 0));
