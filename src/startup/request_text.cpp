@@ -1,21 +1,15 @@
 #include "startup/request_text.h"
 
 #include <QLocale>
-#include <QStringDecoder>
 #include <cmath>
 
 #include "util/errors.h"
+#include "util/hebrew_text.h"
 
 namespace zv {
 
 QString DecodeArgumentText(const QByteArray& bytes) {
-    QStringDecoder utf8(QStringDecoder::Utf8, QStringDecoder::Flag::Stateless);
-    const QString text = utf8.decode(bytes);
-    if (!utf8.hasError()) {
-        return text;
-    }
-    QStringDecoder hebrew("windows-1255");
-    return hebrew.decode(bytes);
+    return DecodeUtf8OrWindows1255(bytes);
 }
 
 QStringList SplitRequest(const QString& argumentText) {

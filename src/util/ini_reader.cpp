@@ -1,10 +1,10 @@
 #include "util/ini_reader.h"
 
 #include <QFile>
-#include <QStringDecoder>
 
 #include "util/errors.h"
 #include "util/file_utils.h"
+#include "util/hebrew_text.h"
 #include "util/ui.h"
 
 namespace zv {
@@ -12,16 +12,6 @@ namespace {
 
 // The longest value the suite's reader returns (a 512-character buffer with its NUL).
 constexpr qsizetype kMaxValue = 511;
-
-QString DecodeText(const QByteArray& bytes) {
-    QStringDecoder utf8(QStringDecoder::Utf8, QStringDecoder::Flag::Stateless);
-    const QString text = utf8.decode(bytes);
-    if (!utf8.hasError()) {
-        return text;
-    }
-    QStringDecoder hebrew("windows-1255");
-    return hebrew.decode(bytes);
-}
 
 QString Unquoted(const QString& value) {
     if (value.size() >= 2) {
@@ -76,7 +66,7 @@ QString ReadINI(const QString& section, const QString& key, const QString& fileN
              if (!file.open(QIODevice::ReadOnly)) {
                  throw MakeError(err::PermissionDenied);
              }
-             QString text = DecodeText(file.readAll());
+             QString text = DecodeUtf8OrWindows1255(file.readAll());
              if (text.startsWith(QChar(0xFEFF))) {
                  text.remove(0, 1);
              }
