@@ -1,7 +1,5 @@
 #include "dialogs/frm_get_password.h"
 
-#include <QShowEvent>
-
 #include "ui/font_fix.h"
 #include "ui_frm_get_password.h"
 #include "util/ui.h"
@@ -9,7 +7,7 @@
 namespace zv {
 
 FrmGetPassword::FrmGetPassword(QWidget* parent)
-    : QDialog(parent), ui_(std::make_unique<::Ui::FrmGetPassword>()) {
+    : PickerDialog(parent), ui_(std::make_unique<::Ui::FrmGetPassword>()) {
     ui_->setupUi(this);
     connect(ui_->Command1, &QPushButton::clicked, this, &FrmGetPassword::Confirm);
     connect(ui_->Text1, &QLineEdit::returnPressed, this, &FrmGetPassword::Confirm);
@@ -27,16 +25,7 @@ QPushButton& FrmGetPassword::Command1() const {
     return *ui_->Command1;
 }
 
-void FrmGetPassword::showEvent(QShowEvent* e) {
-    if (!loaded_) {
-        Load();
-    }
-    QDialog::showEvent(e);
-}
-
 void FrmGetPassword::Load() {
-    loaded_ = true;
-    isCancel_ = false;
     FixControlsFontOnMe(*this);
     ui_->Label1->setText(teur_);
     if (passChar_.isEmpty()) {
@@ -50,14 +39,8 @@ void FrmGetPassword::Load() {
 }
 
 void FrmGetPassword::Confirm() {
-    isCancel_ = false;
-    hide();
+    HideConfirmed();
     DoEvents();
-}
-
-void FrmGetPassword::reject() {
-    isCancel_ = true;
-    QDialog::reject();
 }
 
 }  // namespace zv

@@ -2,8 +2,9 @@
 // Asks for one line of text, usually a password behind a mask character. The window does
 // not judge what is typed; the caller reads Text1 when IsCancel is false.
 
-#include <QDialog>
 #include <memory>
+
+#include "ui/picker_dialog.h"
 
 class QLabel;
 class QLineEdit;
@@ -15,7 +16,7 @@ class FrmGetPassword;
 
 namespace zv {
 
-class FrmGetPassword : public QDialog {
+class FrmGetPassword : public PickerDialog {
     Q_OBJECT
 
   public:
@@ -28,29 +29,18 @@ class FrmGetPassword : public QDialog {
     // The mask character; empty shows what is typed.
     const QString& PassChar() const { return passChar_; }
     void SetPassChar(const QString& v) { passChar_ = v; }
-    // True when the window was closed without confirming.
-    bool IsCancel() const { return isCancel_; }
 
     QLabel& Label1() const;
     QLineEdit& Text1() const;
     QPushButton& Command1() const;
 
-  public slots:
-    // Closing by any way but confirming.
-    void reject() override;
-
-  protected:
-    void showEvent(QShowEvent* e) override;
-
   private:
-    void Load();
+    void Load() override;
     void Confirm();
 
     std::unique_ptr<::Ui::FrmGetPassword> ui_;
     QString teur_;
     QString passChar_;
-    bool isCancel_ = false;
-    bool loaded_ = false;
 };
 
 }  // namespace zv

@@ -1,7 +1,6 @@
 #include "dialogs/frm_get_users.h"
 
 #include <QListWidget>
-#include <QShowEvent>
 
 #include "data/database.h"
 #include "data/recordset.h"
@@ -14,7 +13,7 @@
 namespace zv {
 
 FrmGetUsers::FrmGetUsers(QWidget* parent)
-    : QDialog(parent), ui_(std::make_unique<::Ui::FrmGetUsers>()) {
+    : PickerDialog(parent), ui_(std::make_unique<::Ui::FrmGetUsers>()) {
     ui_->setupUi(this);
     connect(ui_->Command1, &QPushButton::clicked, this, &FrmGetUsers::Confirm);
 }
@@ -32,16 +31,7 @@ QPushButton& FrmGetUsers::Command1() const {
     return *ui_->Command1;
 }
 
-void FrmGetUsers::showEvent(QShowEvent* e) {
-    if (!loaded_) {
-        Load();
-    }
-    QDialog::showEvent(e);
-}
-
 void FrmGetUsers::Load() {
-    loaded_ = true;
-    isCancel_ = false;
     FixControlsFontOnMe(*this);
     initCbo();
     ui_->List1->setFocus();
@@ -99,13 +89,7 @@ void FrmGetUsers::Confirm() {
         }
     }
     endUsers_ = chosen.join(u';');
-    isCancel_ = false;
-    hide();
-}
-
-void FrmGetUsers::reject() {
-    isCancel_ = true;
-    QDialog::reject();
+    HideConfirmed();
 }
 
 }  // namespace zv

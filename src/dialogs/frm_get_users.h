@@ -2,8 +2,9 @@
 // Picks one or more users of the office (table USERS of PUB.MDB, the users of this
 // installation's office code). Names go in and come out separated by ";".
 
-#include <QDialog>
 #include <memory>
+
+#include "ui/picker_dialog.h"
 
 class QListWidget;
 class QPushButton;
@@ -14,7 +15,7 @@ class FrmGetUsers;
 
 namespace zv {
 
-class FrmGetUsers : public QDialog {
+class FrmGetUsers : public PickerDialog {
     Q_OBJECT
 
   public:
@@ -31,19 +32,12 @@ class FrmGetUsers : public QDialog {
     const QString& EndUsers() const { return endUsers_; }
     bool WithAllUsers() const { return withAllUsers_; }
     void SetWithAllUsers(bool v) { withAllUsers_ = v; }
-    bool IsCancel() const { return isCancel_; }
 
     QListWidget& List1() const;
     QPushButton& Command1() const;
 
-  public slots:
-    void reject() override;
-
-  protected:
-    void showEvent(QShowEvent* e) override;
-
   private:
-    void Load();
+    void Load() override;
     void initCbo();
     void Confirm();
 
@@ -51,8 +45,6 @@ class FrmGetUsers : public QDialog {
     QString startUsers_;
     QString endUsers_;
     bool withAllUsers_ = false;
-    bool isCancel_ = false;
-    bool loaded_ = false;
 };
 
 }  // namespace zv

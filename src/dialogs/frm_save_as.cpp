@@ -1,7 +1,5 @@
 #include "dialogs/frm_save_as.h"
 
-#include <QShowEvent>
-
 #include "ui/font_fix.h"
 #include "ui_frm_save_as.h"
 #include "util/state.h"
@@ -18,7 +16,8 @@ qsizetype LastSeparator(const QString& path) {
 
 }  // namespace
 
-FrmSaveAs::FrmSaveAs(QWidget* parent) : QDialog(parent), ui_(std::make_unique<::Ui::FrmSaveAs>()) {
+FrmSaveAs::FrmSaveAs(QWidget* parent)
+    : PickerDialog(parent), ui_(std::make_unique<::Ui::FrmSaveAs>()) {
     ui_->setupUi(this);
     connect(ui_->CmdSave, &QPushButton::clicked, this, &FrmSaveAs::Confirm);
     connect(ui_->CmdCancel, &QPushButton::clicked, this, &FrmSaveAs::reject);
@@ -53,16 +52,7 @@ QStringList FrmSaveAs::DocumentExtensions(const QString& sourceExt) {
     return list;
 }
 
-void FrmSaveAs::showEvent(QShowEvent* e) {
-    if (!loaded_) {
-        Load();
-    }
-    QDialog::showEvent(e);
-}
-
 void FrmSaveAs::Load() {
-    loaded_ = true;
-    isCancel_ = false;
     FixControlsFontOnMe(*this);
     const qsizetype cut = LastSeparator(fileName_);
     ui_->LDir->setText(fileName_.left(cut + 1));
@@ -81,13 +71,7 @@ void FrmSaveAs::Load() {
 }
 
 void FrmSaveAs::Confirm() {
-    isCancel_ = false;
-    hide();
-}
-
-void FrmSaveAs::reject() {
-    isCancel_ = true;
-    QDialog::reject();
+    HideConfirmed();
 }
 
 }  // namespace zv

@@ -3,10 +3,11 @@
 // target folder, an editable name and the extension. The caller builds the path from
 // TxtName and CboEndName when IsCancel is false, and does the copying.
 
-#include <QDialog>
 #include <QStringList>
 #include <cstdint>
 #include <memory>
+
+#include "ui/picker_dialog.h"
 
 class QComboBox;
 class QLabel;
@@ -19,7 +20,7 @@ class FrmSaveAs;
 
 namespace zv {
 
-class FrmSaveAs : public QDialog {
+class FrmSaveAs : public PickerDialog {
     Q_OBJECT
 
   public:
@@ -32,7 +33,6 @@ class FrmSaveAs : public QDialog {
     // 2 for a document, anything else for a mail item.
     int16_t Sug() const { return sug_; }
     void SetSug(int16_t v) { sug_ = v; }
-    bool IsCancel() const { return isCancel_; }
 
     // The extensions offered for a document whose source has the extension sourceExt.
     static QStringList DocumentExtensions(const QString& sourceExt);
@@ -43,21 +43,13 @@ class FrmSaveAs : public QDialog {
     QPushButton& CmdSave() const;
     QPushButton& CmdCancel() const;
 
-  public slots:
-    void reject() override;
-
-  protected:
-    void showEvent(QShowEvent* e) override;
-
   private:
-    void Load();
+    void Load() override;
     void Confirm();
 
     std::unique_ptr<::Ui::FrmSaveAs> ui_;
     QString fileName_;
     int16_t sug_ = 0;
-    bool isCancel_ = false;
-    bool loaded_ = false;
 };
 
 }  // namespace zv
