@@ -133,8 +133,6 @@ QString FileWithoutWindow(int mode, const QString& path, const QString& name,
                        vbOKOnly | vbExclamation);
                 return std::nullopt;
             });
-    } catch (const VbError& e) {
-        MsgBox(FilingFailureText(e, mode, path, name));
     } catch (const std::exception& e) {
         MsgBox(FilingFailureText(AsVbError(e), mode, path, name));
     }

@@ -56,8 +56,6 @@ QString WorkWithStr(int mode, const QString& path, const QString& name) {
         answer.nameText = dialog.TxtTeurText();
         answer.details = dialog.Details();
         return FileDocument(mode, path, name, answer, AskSaveAs);
-    } catch (const VbError& e) {
-        MsgBox(FilingFailureText(e, mode, path, name));
     } catch (const std::exception& e) {
         MsgBox(FilingFailureText(AsVbError(e), mode, path, name));
     }
