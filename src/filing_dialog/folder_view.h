@@ -32,11 +32,18 @@ class FolderView : public QTreeView {
     // A folder was selected, by the user or by SelectPath.
     void FolderSelected(const QString& path);
 
+  protected:
+    void showEvent(QShowEvent* event) override;
+
   private:
+    void StartModel();
+    void ShowRoot();
+    bool ShowSelected(const QString& path);
+    void Select(const QString& path);
     void HideOutsideRows(const QModelIndex& parent, int first, int last);
     void OnCurrentChanged(const QModelIndex& current);
 
-    QFileSystemModel* model_;
+    QFileSystemModel* model_ = nullptr;
     QString root_;
     QString top_;
     QString selected_;

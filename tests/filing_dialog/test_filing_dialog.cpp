@@ -446,6 +446,8 @@ class TestFilingDialog : public QObject {
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
         const QString mailIn = f.Docs() + u"/MAILIN"_s;
+        // The folder chosen while the tree was hidden is the one it shows.
+        QCOMPARE(tree.currentIndex().data().toString(), u"MAILIN"_s);
 
         // Nothing outside the archive can be selected.
         QVERIFY(!tree.SelectPath(f.DataDir() + u"/Def"_s));
