@@ -26,12 +26,7 @@ Result RunProgram(const QList<QByteArray>& args, const test::TestEnv& env) {
         script += QStringLiteral("')\"");
     }
     QProcess p;
-    QProcessEnvironment pe = QProcessEnvironment::systemEnvironment();
-    pe.insert(QStringLiteral("XDG_CONFIG_HOME"), env.ConfigHome());
-    pe.insert(QStringLiteral("LOCALAPPDATA"), env.LocalAppData());
-    pe.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
-    pe.remove(QStringLiteral("ZORVANE_DEVELOPMENT_RUN"));
-    p.setProcessEnvironment(pe);
+    p.setProcessEnvironment(env.ProgramEnvironment());
     p.start(QStringLiteral("/bin/sh"),
             {QStringLiteral("-c"), script,
              qEnvironmentVariable("ZV_TEST_BUILD_DIR") + QStringLiteral("/src/app/zorvane-filer")});

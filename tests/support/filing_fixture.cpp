@@ -113,12 +113,7 @@ QString FilingFixture::RunWithDialog(int mode, const QString& path, const QStrin
 
 ProcessResult FilingFixture::RunProgram(const QStringList& args) const {
     QProcess p;
-    QProcessEnvironment pe = QProcessEnvironment::systemEnvironment();
-    pe.insert(QStringLiteral("XDG_CONFIG_HOME"), env_.ConfigHome());
-    pe.insert(QStringLiteral("LOCALAPPDATA"), env_.LocalAppData());
-    pe.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
-    pe.remove(QStringLiteral("ZORVANE_DEVELOPMENT_RUN"));
-    p.setProcessEnvironment(pe);
+    p.setProcessEnvironment(env_.ProgramEnvironment());
     p.start(QStringLiteral(ZV_FILER), args);
     if (!p.waitForFinished(60000)) {
         p.kill();

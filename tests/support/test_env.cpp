@@ -45,4 +45,13 @@ QString TestEnv::DataDir() const {
     return dir_.path() + QStringLiteral("/data");
 }
 
+QProcessEnvironment TestEnv::ProgramEnvironment() const {
+    QProcessEnvironment pe = QProcessEnvironment::systemEnvironment();
+    pe.insert(QStringLiteral("XDG_CONFIG_HOME"), ConfigHome());
+    pe.insert(QStringLiteral("LOCALAPPDATA"), LocalAppData());
+    pe.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
+    pe.remove(QStringLiteral("ZORVANE_DEVELOPMENT_RUN"));
+    return pe;
+}
+
 }  // namespace zv::test

@@ -2,6 +2,7 @@
 // A temporary environment for one test: the per-user settings store, LOCALAPPDATA and a
 // data folder all live in a fresh temporary folder, and process-wide state starts empty.
 
+#include <QProcessEnvironment>
 #include <QString>
 #include <QTemporaryDir>
 
@@ -22,6 +23,9 @@ class TestEnv {
     QString LocalAppData() const;
     // A folder for the installation's data (MainPath), not created.
     QString DataDir() const;
+    // The environment for a program started by the test: this test's settings, no display,
+    // never a development run.
+    QProcessEnvironment ProgramEnvironment() const;
 
   private:
     QTemporaryDir dir_;
