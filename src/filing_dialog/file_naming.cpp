@@ -64,6 +64,16 @@ bool IsRegularFile(const QByteArray& dir, const dirent& entry) {
 
 }  // namespace
 
+QString ForbiddenNameChars() {
+    // The request handler fills BadFileChars when it cleans the proposed name; the dialog
+    // guards its name box with the same nine characters even before that has happened.
+    return BadFileChars().isEmpty() ? QStringLiteral("/\\:*?\"<>|") : BadFileChars();
+}
+
+QString ForbiddenNameMessage() {
+    return QStringLiteral("אסור לקלוט כחלק משם קובץ את התווים הבאים : ") + ForbiddenNameChars();
+}
+
 QString CCpath(const QString& path) {
     if (path.isEmpty()) {
         MsgBox(QStringLiteral("אין הגדרת ספריה לעבודה"), vbCritical);

@@ -7,6 +7,11 @@
 
 namespace zv {
 
+// The characters refused in a file name.
+QString ForbiddenNameChars();
+// The message shown when one of them is refused.
+QString ForbiddenNameMessage();
+
 // The path with exactly one trailing separator; an empty path is refused with a message and
 // gives an empty result.
 QString CCpath(const QString& path);

@@ -5,6 +5,7 @@
 
 #include "controls/gdate.h"
 #include "dialogs/frm_get_password.h"
+#include "filing_dialog/file_naming.h"
 #include "filing_dialog/frm_get_doc_det.h"
 #include "filing_dialog/name_guard.h"
 #include "ui_frm_get_doc_det.h"

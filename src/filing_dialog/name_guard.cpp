@@ -4,7 +4,7 @@
 #include <QLineEdit>
 #include <algorithm>
 
-#include "util/state.h"
+#include "filing_dialog/file_naming.h"
 #include "util/ui.h"
 
 namespace zv {
@@ -16,16 +16,6 @@ bool HasForbidden(const QString& text) {
 }
 
 }  // namespace
-
-QString ForbiddenNameChars() {
-    // The request handler fills BadFileChars when it cleans the proposed name; the dialog
-    // guards its name box with the same nine characters even before that has happened.
-    return BadFileChars().isEmpty() ? QStringLiteral("/\\:*?\"<>|") : BadFileChars();
-}
-
-QString ForbiddenNameMessage() {
-    return QStringLiteral("אסור לקלוט כחלק משם קובץ את התווים הבאים : ") + ForbiddenNameChars();
-}
 
 NameGuard::NameGuard(QLineEdit* edit) : QObject(edit), edit_(edit), accepted_(edit->text()) {
     edit->installEventFilter(this);

@@ -10,11 +10,6 @@ class QLineEdit;
 
 namespace zv {
 
-// The characters refused in a file name.
-QString ForbiddenNameChars();
-// The message shown when one of them is refused.
-QString ForbiddenNameMessage();
-
 class NameGuard : public QObject {
     Q_OBJECT
 

@@ -16,8 +16,9 @@ int ConsoleUi::MsgBox(const QString& text, int style, const QString&) {
 }
 
 void ConsoleUi::ShowModal(QWidget& window) {
-    // As if the user closed it: pickers then report IsCancel.
-    window.close();
+    // As if the user closed it: pickers then report IsCancel. Called by name, so that a batch
+    // run, which never makes a window, links no window code.
+    QMetaObject::invokeMethod(&window, "close", Qt::DirectConnection);
 }
 
 void ConsoleUi::DoEvents() {

@@ -19,6 +19,7 @@
 #include "dialog_fixture.h"
 #include "dialogs/frm_get_password.h"
 #include "dialogs/frm_get_users.h"
+#include "filing_dialog/file_naming.h"
 #include "filing_dialog/folder_view.h"
 #include "filing_dialog/name_guard.h"
 #include "recording_keyboard.h"
