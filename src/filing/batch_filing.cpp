@@ -9,7 +9,7 @@
 #include "filing_dialog/code_lists.h"
 #include "filing_dialog/docs_folder.h"
 #include "filing_dialog/file_naming.h"
-#include "filing_dialog/name_guard.h"
+#include "startup/backend_selection.h"
 #include "util/clock.h"
 #include "util/state.h"
 #include "util/ui.h"
@@ -137,6 +137,12 @@ QString FileWithoutWindow(int mode, const QString& path, const QString& name,
         MsgBox(FilingFailureText(AsVbError(e), mode, path, name));
     }
     return {};
+}
+
+QString HandleBatchRequest(const CommandLine& cl, int mode, const QString& path,
+                           const QString& name) {
+    GetMSSQLParam();
+    return FileWithoutWindow(mode, path, name, cl.filing);
 }
 
 }  // namespace zv

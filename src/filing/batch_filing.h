@@ -4,6 +4,7 @@
 
 #include <QString>
 
+#include "startup/command_line.h"
 #include "startup/filing_options.h"
 
 namespace zv {
@@ -14,5 +15,9 @@ namespace zv {
 // path, or empty when nothing was filed.
 QString FileWithoutWindow(int mode, const QString& path, const QString& name,
                           const FilingOptions& options);
+
+// A --batch request that passed Main: selects the back-ends, then files without a window.
+QString HandleBatchRequest(const CommandLine& cl, int mode, const QString& path,
+                           const QString& name);
 
 }  // namespace zv

@@ -8,9 +8,11 @@ namespace zv {
 
 QString HandleFilingRequest(const CommandLine& cl, int mode, const QString& path,
                             const QString& name) {
+    if (cl.batch) {
+        return HandleBatchRequest(cl, mode, path, name);
+    }
     GetMSSQLParam();
-    return cl.batch ? FileWithoutWindow(mode, path, name, cl.filing)
-                    : WorkWithStr(mode, path, name);
+    return WorkWithStr(mode, path, name);
 }
 
 }  // namespace zv
