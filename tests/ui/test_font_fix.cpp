@@ -1,7 +1,6 @@
 // The window font fixes: which controls change, the per-user marker that stops them, the
-// medium font of the settings and its cache; and finding a loaded window by name.
+// medium font of the settings and its cache.
 #include <QCheckBox>
-#include <QDir>
 #include <QFontInfo>
 #include <QFontMetrics>
 #include <QLabel>
@@ -12,8 +11,8 @@
 #include "controls/gdate.h"
 #include "scripted_ui.h"
 #include "test_env.h"
+#include "test_files.h"
 #include "ui/font_fix.h"
-#include "ui/form_is_loaded.h"
 #include "util/settings_store.h"
 #include "util/state.h"
 
@@ -28,7 +27,6 @@ const QString kArial = u"Arial"_s;
 class Window : public QWidget {
   public:
     Window() {
-        setObjectName(u"FrmTest"_s);
         Add<QCheckBox>("ChkMarlett")->setFont(QFont(u"Marlett"_s, 11));
         Add<QCheckBox>("CmdSearch");
         Add<QCheckBox>("chkcolor_2");  // member of an exempt control array, other case
@@ -37,15 +35,9 @@ class Window : public QWidget {
         Add<QPushButton>("CmdGet");  // an exempt name, but a plain button
         Add<QLabel>("Label1");
         Add<QLineEdit>("TxtTeur");
-        auto* date = new GDate(this);
-        date->setObjectName(u"TDate"_s);
+        Add<GDate>("TDate");
     }
-
-    QWidget& Control(const char* name) {
-        auto* w = findChild<QWidget*>(QLatin1String(name));
-        Q_ASSERT(w);
-        return *w;
-    }
+    QFont FontOf(const QString& name) const { return findChild<QWidget*>(name)->font(); }
 
   private:
     template <class T>
@@ -57,12 +49,6 @@ class Window : public QWidget {
     }
 };
 
-void WriteMarker(const QString& dataDir, const QString& user) {
-    QDir().mkpath(dataDir + u"/GDetDef"_s);
-    QFile marker(dataDir + u"/GDetDef/StopFixFonts."_s + user);
-    QVERIFY(marker.open(QIODevice::WriteOnly));
-}
-
 void SaveGeneral(const QString& key, const QString& value) {
     SaveSetting(u"Kavex32"_s, u"General"_s, key, value);
 }
@@ -72,190 +58,125 @@ void SaveGeneral(const QString& key, const QString& value) {
 class TestFontFix : public QObject {
     Q_OBJECT
   private Q_SLOTS:
-    void init();
-    void cleanup();
-    void fixesControls_data();
-    void fixesControls();
-    void fixedFontHasHebrewGlyphs();
-    void markerStopsOnlyItsUser_data();
-    void markerStopsOnlyItsUser();
-    void mediumFont_data();
-    void mediumFont();
-    void mediumFontCache_data();
-    void mediumFontCache();
-    void mediumFontBadSizeIsReported();
-    void formIsLoaded();
+    void init() {
+        env_ = std::make_unique<test::TestEnv>();
+        ui_ = std::make_unique<test::ScopedScriptedUi>();
+        SetMainPath(env_->DataDir());
+        SetMyUser(u"7"_s);
+    }
+    void cleanup() {
+        QVERIFY2((*ui_)->Messages().empty(), qPrintable((*ui_)->Texts().join(u'|')));
+        ui_.reset();
+        env_.reset();
+    }
+
+    void fixesControls() {
+        Window w;
+        FixControlsFontOnMe(w);
+        const QStringList fixed{"CmdOK", "CmdGet", "Label1", "TxtTeur", "TDate"};
+        for (const QString& name :
+             fixed + QStringList{"ChkMarlett", "CmdSearch", "chkcolor_2", "CmdSearchTik"}) {
+            const QFont f = w.FontOf(name);
+            QVERIFY2((f.family() == FixedFontFamily()) == fixed.contains(name) &&
+                         f.pointSize() == (fixed.contains(name) ? 8 : 11),
+                     qPrintable(name));
+        }
+    }
+
+    void fixedFontHasHebrewGlyphs() {
+        QLabel label(u"שלום"_s);
+        label.setObjectName(u"Label1"_s);
+        FixControlCharset(label);
+        const QFontMetrics metrics(label.font());
+        for (const QChar ch : u"אבגדהוזחטיכלמנסעפצקרשת"_s) {
+            QVERIFY2(metrics.inFont(ch), qPrintable(QFontInfo(label.font()).family()));
+        }
+    }
+
+    // Another user's marker leaves the fixes on; this user's stops them.
+    void markerStopsOnlyItsUser() {
+        for (const QString& user : {u"8"_s, u"7"_s}) {
+            QVERIFY(test::WriteFile(env_->DataDir() + u"/GDetDef/StopFixFonts."_s + user, {}));
+            Window w;
+            FixControlsFontOnMe(w);
+            QCOMPARE(w.FontOf(u"Label1"_s).family(), user == u"8"_s ? FixedFontFamily() : kArial);
+        }
+    }
+
+    // The special pair wins while its size is a number; else the other pair, when complete.
+    void mediumFont_data() {
+        QTest::addColumn<QStringList>("settings");  // key=value pairs
+        QTest::addColumn<QString>("family");        // empty: nothing changes
+        QTest::addColumn<double>("size");
+        QTest::newRow("special pair wins")
+            << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=10.5", "MedFontName=Courier",
+                           "MedFontSize=12"}
+            << u"Tahoma"_s << 10.5;
+        QTest::newRow("special size not numeric, fallback pair")
+            << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=abc", "MedFontName=Courier",
+                           "MedFontSize=12"}
+            << u"Courier"_s << 12.0;
+        QTest::newRow("special size empty, no fallback")
+            << QStringList{"MedFontNameSpe=Tahoma"} << QString() << 0.0;
+    }
+
+    // Labels, buttons and check boxes take it; text boxes and symbol buttons do not.
+    void mediumFont() {
+        QFETCH(QStringList, settings);
+        QFETCH(QString, family);
+        QFETCH(double, size);
+        for (const QString& pair : settings) {
+            SaveGeneral(pair.section(u'=', 0, 0), pair.section(u'=', 1));
+        }
+        Window w;
+        const QStringList changing = {"Label1", "CmdOK", "CmdGet"};
+        for (const QString& name : changing + QStringList{"TxtTeur", "CmdSearch", "chkcolor_2"}) {
+            auto* control = w.findChild<QWidget*>(name);
+            SetMedFont(*control);
+            const bool changed = !family.isEmpty() && changing.contains(name);
+            QCOMPARE(control->font().family(), changed ? family : kArial);
+            QCOMPARE(control->font().pointSizeF(), changed ? size : 11.0);
+        }
+    }
+
+    void mediumFontCache_data() {
+        QTest::addColumn<QString>("suffix");
+        QTest::addColumn<QString>("family");  // after the settings change
+        QTest::newRow("special pair is kept") << u"Spe"_s << u"Tahoma"_s;
+        QTest::newRow("fallback pair is read each time") << QString() << u"Courier"_s;
+    }
+
+    void mediumFontCache() {
+        QFETCH(QString, suffix);
+        QFETCH(QString, family);
+        SaveGeneral(u"MedFontName"_s + suffix, u"Tahoma"_s);
+        SaveGeneral(u"MedFontSize"_s + suffix, u"10"_s);
+        QLabel first;
+        SetMedFont(first);
+        QCOMPARE(first.font().family(), u"Tahoma"_s);
+        SaveGeneral(u"MedFontName"_s + suffix, u"Courier"_s);
+        SaveGeneral(u"MedFontSize"_s + suffix, u"14"_s);
+        QLabel second;
+        SetMedFont(second);
+        QCOMPARE(second.font().family(), family);
+        QCOMPARE(second.font().pointSizeF(), family == u"Tahoma"_s ? 10.0 : 14.0);
+    }
+
+    void mediumFontBadSizeIsReported() {
+        SaveGeneral(u"MedFontNameSpe"_s, u"Tahoma"_s);
+        SaveGeneral(u"MedFontSizeSpe"_s, u"1e999"_s);
+        QLabel label;
+        label.setFont(QFont(kArial, 11));
+        SetMedFont(label);
+        QCOMPARE((*ui_)->Texts(), QStringList{u"6-0--Overflow"_s});
+        QCOMPARE(label.font().family(), kArial);
+        (*ui_)->Clear();
+    }
 
   private:
     std::unique_ptr<test::TestEnv> env_;
     std::unique_ptr<test::ScopedScriptedUi> ui_;
 };
-
-void TestFontFix::init() {
-    env_ = std::make_unique<test::TestEnv>();
-    ui_ = std::make_unique<test::ScopedScriptedUi>();
-    QDir().mkpath(env_->DataDir());
-    SetMainPath(env_->DataDir());
-    SetMyUser(u"7"_s);
-}
-
-void TestFontFix::cleanup() {
-    QVERIFY2((*ui_)->Messages().empty(), qPrintable((*ui_)->Texts().join(u'|')));
-    ui_.reset();
-    env_.reset();
-}
-
-void TestFontFix::fixesControls_data() {
-    QTest::addColumn<QString>("control");
-    QTest::addColumn<bool>("fixed");
-    QTest::newRow("Marlett check box") << u"ChkMarlett"_s << false;
-    QTest::newRow("exempt check box") << u"CmdSearch"_s << false;
-    QTest::newRow("exempt control array, other case") << u"chkcolor_2"_s << false;
-    QTest::newRow("exempt checkable button") << u"CmdSearchTik"_s << false;
-    QTest::newRow("ordinary check box") << u"CmdOK"_s << true;
-    QTest::newRow("exempt name on a plain button") << u"CmdGet"_s << true;
-    QTest::newRow("label") << u"Label1"_s << true;
-    QTest::newRow("date box") << u"TDate"_s << true;
-}
-
-void TestFontFix::fixesControls() {
-    QFETCH(QString, control);
-    QFETCH(bool, fixed);
-    Window w;
-    const QFont before = w.Control(qPrintable(control)).font();
-    FixControlsFontOnMe(w);
-    const QFont after = w.Control(qPrintable(control)).font();
-    if (fixed) {
-        QCOMPARE(after.family(), FixedFontFamily());
-        QCOMPARE(after.pointSize(), 8);
-    } else {
-        QCOMPARE(after.family(), before.family());
-        QCOMPARE(after.pointSize(), 11);
-    }
-}
-
-void TestFontFix::fixedFontHasHebrewGlyphs() {
-    QLabel label(u"שלום"_s);
-    label.setObjectName(u"Label1"_s);
-    FixControlCharset(label);
-    const QFontMetrics metrics(label.font());
-    for (const QChar ch : u"אבגדהוזחטיכלמנסעפצקרשת"_s) {
-        QVERIFY2(metrics.inFont(ch), qPrintable(QFontInfo(label.font()).family()));
-    }
-}
-
-void TestFontFix::markerStopsOnlyItsUser_data() {
-    QTest::addColumn<QString>("markerUser");
-    QTest::addColumn<bool>("fixed");
-    QTest::newRow("marker of this user") << u"7"_s << false;
-    QTest::newRow("marker of another user") << u"8"_s << true;
-    QTest::newRow("no marker") << QString() << true;
-}
-
-void TestFontFix::markerStopsOnlyItsUser() {
-    QFETCH(QString, markerUser);
-    QFETCH(bool, fixed);
-    if (!markerUser.isEmpty()) {
-        WriteMarker(env_->DataDir(), markerUser);
-    }
-    Window w;
-    FixControlsFontOnMe(w);
-    for (const char* name : {"CmdOK", "Label1", "TxtTeur"}) {
-        QCOMPARE(w.Control(name).font().family(), fixed ? FixedFontFamily() : kArial);
-    }
-}
-
-void TestFontFix::mediumFont_data() {
-    QTest::addColumn<QStringList>("settings");  // key=value pairs
-    QTest::addColumn<QString>("family");        // empty: nothing changes
-    QTest::addColumn<double>("size");
-    QTest::newRow("special pair wins")
-        << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=10.5", "MedFontName=Courier",
-                       "MedFontSize=12"}
-        << u"Tahoma"_s << 10.5;
-    QTest::newRow("special size not numeric, fallback pair")
-        << QStringList{"MedFontNameSpe=Tahoma", "MedFontSizeSpe=abc", "MedFontName=Courier",
-                       "MedFontSize=12"}
-        << u"Courier"_s << 12.0;
-    QTest::newRow("special size empty, no fallback")
-        << QStringList{"MedFontNameSpe=Tahoma"} << QString() << 0.0;
-    QTest::newRow("nothing set") << QStringList{} << QString() << 0.0;
-}
-
-void TestFontFix::mediumFont() {
-    QFETCH(QStringList, settings);
-    QFETCH(QString, family);
-    QFETCH(double, size);
-    for (const QString& pair : settings) {
-        SaveGeneral(pair.section(u'=', 0, 0), pair.section(u'=', 1));
-    }
-    Window w;
-    const QStringList changing = {"Label1", "CmdOK", "CmdGet"};
-    const QStringList keeping = {"TxtTeur", "CmdSearch", "chkcolor_2"};
-    for (const QString& name : changing + keeping) {
-        SetMedFont(w.Control(qPrintable(name)));
-    }
-    for (const QString& name : changing + keeping) {
-        const QFont f = w.Control(qPrintable(name)).font();
-        if (!family.isEmpty() && changing.contains(name)) {
-            QCOMPARE(f.family(), family);
-            QCOMPARE(f.pointSizeF(), size);
-        } else {
-            QCOMPARE(f.family(), kArial);
-            QCOMPARE(f.pointSizeF(), 11.0);
-        }
-    }
-}
-
-void TestFontFix::mediumFontCache_data() {
-    QTest::addColumn<QString>("suffix");
-    QTest::addColumn<QString>("family");  // after the settings change
-    QTest::newRow("special pair is kept") << u"Spe"_s << u"Tahoma"_s;
-    QTest::newRow("fallback pair is read each time") << QString() << u"Courier"_s;
-}
-
-void TestFontFix::mediumFontCache() {
-    QFETCH(QString, suffix);
-    QFETCH(QString, family);
-    SaveGeneral(u"MedFontName"_s + suffix, u"Tahoma"_s);
-    SaveGeneral(u"MedFontSize"_s + suffix, u"10"_s);
-    QLabel first;
-    SetMedFont(first);
-    QCOMPARE(first.font().family(), u"Tahoma"_s);
-    SaveGeneral(u"MedFontName"_s + suffix, u"Courier"_s);
-    SaveGeneral(u"MedFontSize"_s + suffix, u"14"_s);
-    QLabel second;
-    SetMedFont(second);
-    QCOMPARE(second.font().family(), family);
-    QCOMPARE(second.font().pointSizeF(), family == u"Tahoma"_s ? 10.0 : 14.0);
-}
-
-void TestFontFix::mediumFontBadSizeIsReported() {
-    SaveGeneral(u"MedFontNameSpe"_s, u"Tahoma"_s);
-    SaveGeneral(u"MedFontSizeSpe"_s, u"1e999"_s);
-    QLabel label;
-    label.setFont(QFont(kArial, 11));
-    SetMedFont(label);
-    QCOMPARE((*ui_)->Texts(), QStringList{u"6-0--Overflow"_s});
-    QCOMPARE(label.font().family(), kArial);
-    (*ui_)->Clear();
-}
-
-void TestFontFix::formIsLoaded() {
-    QVERIFY(!FormIsLoaded(u"FrmGetDocDet"_s));
-    auto* dialog = new QWidget;
-    dialog->setObjectName(u"FrmGetDocDet"_s);
-    auto* child = new QWidget(dialog);
-    child->setObjectName(u"CmdOK"_s);
-    // Loaded, whether shown or hidden; only windows count.
-    QVERIFY(FormIsLoaded(u"frmgetdocdet"_s));
-    dialog->show();
-    QVERIFY(FormIsLoaded(u"FRMGETDOCDET"_s));
-    QVERIFY(!FormIsLoaded(u"CmdOK"_s));
-    QVERIFY(!FormIsLoaded(u"FrmGetDoc"_s));
-    delete dialog;
-    QVERIFY(!FormIsLoaded(u"FrmGetDocDet"_s));
-}
 
 QTEST_MAIN(TestFontFix)
 #include "test_font_fix.moc"
