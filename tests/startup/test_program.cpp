@@ -1,5 +1,5 @@
-// The built program as the suite starts it: exit status, messages on standard error in
-// --batch, and the work folders it leaves.
+// The built program as the suite starts it: the request's bytes, exit status and messages on
+// standard error in --batch, and the window libraries it loads.
 #include <QStringEncoder>
 #include <QtTest>
 
@@ -46,45 +46,25 @@ Result RunProgram(const QList<QByteArray>& args, const QProcessEnvironment& env,
 class TestProgram : public QObject {
     Q_OBJECT
   private Q_SLOTS:
-    void refusals();
-    void windows1255RequestPreparesWorkFolders();
+    void windows1255Request();
     void windowLibrariesOnlyWhereAWindowMayShow();
 };
 
-// In --batch the refusals go to standard error, the value after the line break on a line of
-// its own ("%M" stands for MainPath).
-void TestProgram::refusals() {
-    for (const bool installed : {false, true}) {
-        test::TestEnv env;
-        if (installed) {
-            test::MakeInstallation(env, false);
-        }
-        const Result r = RunProgram({"--batch", ""}, env.ProgramEnvironment());
-        QCOMPARE(r.status, 1);
-        const QString expected =
-            installed ? QStringLiteral("ספריית עבודה לא חוקית לעבודה עם התוסף\n") + env.DataDir()
-                      : QStringLiteral("אין זיהוי של עבודה בזורבן במחשב זה");
-        QVERIFY2(r.err.endsWith(expected + QLatin1Char('\n')), qPrintable(r.err));
-    }
-}
-
-void TestProgram::windows1255RequestPreparesWorkFolders() {
+// The suite passes the request in its ANSI code page: "¥" is the single byte A5. The file's
+// name on disk is UTF-8, so a path decoded from Windows-1255 must match it.
+void TestProgram::windows1255Request() {
     test::TestEnv env;
-    const test::Installation inst = test::MakeInstallation(env);
+    test::MakeInstallation(env);
     const QString hebrewDoc = env.Root() + QStringLiteral("/in/מכתב.doc");
     QVERIFY(test::WriteFile(hebrewDoc, "x"));
-    // The suite passes the request in its ANSI code page: "¥" is the single byte A5. The
-    // file's name on disk is UTF-8, so a path decoded from Windows-1255 must match it.
     QStringEncoder cp1255("windows-1255");
     const QByteArray request = cp1255.encode(QStringLiteral("2¥") + hebrewDoc + "¥נושא");
     const Result r = RunProgram({"--batch", "--client", "1001", request}, env.ProgramEnvironment());
-    // Handled, not filed: this installation has no client databases.
+    // Taken, and not filed for want of client databases; the report names the path and name.
     QCOMPARE(r.status, 1);
-    QVERIFY2(!r.err.contains(QStringLiteral("שרות")), qPrintable(r.err));
-    QStringList folders =
-        QDir(inst.mainPath + QStringLiteral("/Dat1")).entryList(QDir::Dirs | QDir::NoDotAndDotDot);
-    folders.sort();
-    QCOMPARE(folders, (QStringList{"BakMDB", "DTDef", "Def", "GDetDef", "Temp"}));
+    QVERIFY2(!r.err.contains(QStringLiteral("שרות")) &&
+                 r.err.contains(hebrewDoc + QStringLiteral("\nנושא\n")),
+             qPrintable(r.err));
 }
 
 // A batch run loads no window library; every other run loads the windows module beside the
@@ -98,27 +78,25 @@ void TestProgram::windowLibrariesOnlyWhereAWindowMayShow() {
     pe.insert(QStringLiteral("LD_DEBUG"), QStringLiteral("files"));
     pe.insert(QStringLiteral("LD_DEBUG_OUTPUT"), loads + QStringLiteral("/run"));
     const auto loadedWidgets = [&] {
-        QByteArray listed;
+        QString listed;
         for (const QFileInfo& f : QDir(loads).entryInfoList(QDir::Files)) {
-            QFile file(f.filePath());
-            if (file.open(QIODevice::ReadOnly)) {
-                listed += file.readAll();
-            }
+            listed += test::ReadFile(f.filePath());
             QFile::remove(f.filePath());
         }
-        return listed.contains("libQt6Widgets");
+        return listed.contains(QLatin1String("libQt6Widgets"));
     };
-    const QString noInstallation = QStringLiteral("אין זיהוי של עבודה בזורבן במחשב זה\n");
+    const auto notInstalled = [](const Result& r) {
+        return r.status == 1 &&
+               r.err.endsWith(QStringLiteral("אין זיהוי של עבודה בזורבן במחשב זה\n"));
+    };
 
     Result r = RunProgram({"--batch", ""}, pe);
-    QCOMPARE(r.status, 1);
-    QVERIFY2(r.err.endsWith(noInstallation), qPrintable(r.err));
+    QVERIFY2(notInstalled(r), qPrintable(r.err));
     QVERIFY2(!loadedWidgets(), "a batch run loaded the window libraries");
 
     // Qt's own options need QApplication, so this batch run goes through the module.
     r = RunProgram({"-platform", "offscreen", "--batch", ""}, pe);
-    QCOMPARE(r.status, 1);
-    QVERIFY2(r.err.endsWith(noInstallation), qPrintable(r.err));
+    QVERIFY2(notInstalled(r), qPrintable(r.err));
     QVERIFY(loadedWidgets());
 
     r = RunProgram({"--no-such-option"}, pe);
@@ -134,8 +112,7 @@ void TestProgram::windowLibrariesOnlyWhereAWindowMayShow() {
     QVERIFY2(r.err.startsWith(QStringLiteral("zorvane-filer: cannot load its windows: ")),
              qPrintable(r.err));
     r = RunProgram({"--batch", ""}, env.ProgramEnvironment(), alone);
-    QCOMPARE(r.status, 1);
-    QVERIFY2(r.err.endsWith(noInstallation), qPrintable(r.err));
+    QVERIFY2(notInstalled(r), qPrintable(r.err));
 }
 
 QTEST_MAIN(TestProgram)
