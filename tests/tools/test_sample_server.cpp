@@ -1,12 +1,11 @@
 // The sample installation with server databases on the PostgreSQL test cluster: the same
 // rows as the files, server-made document keys. (Its settings file and MSql flags are read
-// back by the back-end selection's server test.)
+// back by the filing dialog's server test.)
 
 #include <QDir>
 #include <QSqlDatabase>
 #include <QSqlQuery>
 #include <QTest>
-#include <QUuid>
 
 #include "sample_install/sample_data.h"
 #include "sample_install/sample_install.h"
@@ -19,7 +18,7 @@ using namespace zv;
 namespace {
 
 // Every row of a table as text lines, in a fixed order, from any connection.
-QStringList Rows(QSqlDatabase db, const SampleTable& t) {
+QStringList Rows(const QSqlDatabase& db, const SampleTable& t) {
     QSqlQuery q(db);
     if (!q.exec(QStringLiteral("SELECT %1 FROM %2").arg(t.columns.join(','), t.table)))
         return {QStringLiteral("<query failed>")};
@@ -34,27 +33,6 @@ QStringList Rows(QSqlDatabase db, const SampleTable& t) {
     return rows;
 }
 
-class Connection {
-  public:
-    explicit Connection(const SampleOptions& o, const QString& database)
-        : name_(QUuid::createUuid().toString()), db_(ConnectSampleServer(o, database, name_)) {}
-    Connection(const QString& file) : name_(QUuid::createUuid().toString()) {
-        db_ = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), name_);
-        db_.setDatabaseName(file);
-        db_.open();
-    }
-    ~Connection() {
-        db_.close();
-        db_ = QSqlDatabase();
-        QSqlDatabase::removeDatabase(name_);
-    }
-    QSqlDatabase db() const { return db_; }
-
-  private:
-    QString name_;
-    QSqlDatabase db_;
-};
-
 }  // namespace
 
 class TestSampleServer : public QObject {
@@ -64,6 +42,7 @@ class TestSampleServer : public QObject {
     void serverHoldsTheFileRowsAndAssignsKeys();
 };
 
+// The connections stay until the program ends, which is right after this test.
 void TestSampleServer::serverHoldsTheFileRowsAndAssignsKeys() {
     test::TestEnv env;
     SampleOptions options = TestServerOptions();
@@ -71,19 +50,25 @@ void TestSampleServer::serverHoldsTheFileRowsAndAssignsKeys() {
     options.clients = 300;
     options.lookfor = 1500;
     CreateSampleInstallation(env.DataDir(), options);
+    QSqlDatabase file =
+        QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), QStringLiteral("file"));
     for (const SampleTable& t : SampleData::Tables()) {
         if (!ServerDatabaseNames().contains(t.database))
             continue;
-        Connection file(QDir(env.DataDir()).filePath(t.database + QStringLiteral(".MDB")));
-        Connection server(options, t.database + options.volnaGlobNum);
-        const QStringList fileRows = Rows(file.db(), t);
+        file.close();
+        file.setDatabaseName(QDir(env.DataDir()).filePath(t.database + QStringLiteral(".MDB")));
+        QVERIFY(file.open());
+        const QStringList fileRows = Rows(file, t);
         QVERIFY2(fileRows.size() > 1, qPrintable(t.table));
-        QCOMPARE(Rows(server.db(), t), fileRows);
+        QCOMPARE(Rows(ConnectSampleServer(options, t.database + options.volnaGlobNum,
+                                          t.database + t.table),
+                      t),
+                 fileRows);
     }
 
     // Document keys are taken by the server, and a repeated path is allowed.
-    Connection docs(options, QStringLiteral("MDOCS") + options.volnaGlobNum);
-    QSqlQuery q(docs.db());
+    QSqlQuery q(ConnectSampleServer(options, QStringLiteral("MDOCS") + options.volnaGlobNum,
+                                    QStringLiteral("keys")));
     for (int expected : {1, 2}) {
         QVERIFY(
             q.exec(QStringLiteral("INSERT INTO DOCS (FULLNAME) VALUES ('\\a.doc') RETURNING ID")));
