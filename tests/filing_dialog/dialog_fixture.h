@@ -2,12 +2,10 @@
 // One filing dialog on a fresh sample installation of its own, with the scripted Ui.
 
 #include <QApplication>
-#include <QSqlDatabase>
-#include <QSqlQuery>
 #include <QTest>
-#include <QUuid>
 #include <memory>
 
+#include "data/database.h"
 #include "filing_dialog/frm_get_doc_det.h"
 #include "sample_install/sample_install.h"
 #include "scripted_ui.h"
@@ -30,16 +28,8 @@ class DialogFixture {
 
     // Runs a statement on one of the installation's file databases.
     void Exec(const QString& database, const QString& sql) {
-        const QString name = QUuid::createUuid().toString();
-        {
-            QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), name);
-            db.setDatabaseName(env_.DataDir() + QLatin1Char('/') + database +
-                               QStringLiteral(".MDB"));
-            QVERIFY(db.open());
-            QSqlQuery q(db);
-            QVERIFY2(q.exec(sql), qPrintable(sql));
-        }
-        QSqlDatabase::removeDatabase(name);
+        SetMainPath(env_.DataDir());
+        Database::Open(database, false)->Execute(sql);
     }
 
     // A new dialog with the caller's presets applied, loaded.
@@ -52,18 +42,12 @@ class DialogFixture {
         dialog_->Load();
         return *dialog_;
     }
-    FrmGetDocDet& Dialog() { return *dialog_; }
 
-    // A control of the dialog by name; the date boxes' own children (their CmdNow) are not
-    // the dialog's.
+    // A control of the dialog by name; the date boxes' own today buttons are not the dialog's.
     template <class T>
     T& Child(const char* name) {
         for (T* w : dialog_->findChildren<T*>(QLatin1String(name))) {
-            bool inDateBox = false;
-            for (QObject* p = w->parent(); p && p != dialog_.get(); p = p->parent()) {
-                inDateBox = inDateBox || p->inherits("zv::GDate");
-            }
-            if (!inDateBox) {
+            if (!w->parent()->inherits("zv::GDate")) {
                 return *w;
             }
         }
