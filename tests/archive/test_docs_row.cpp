@@ -1,14 +1,11 @@
 // The DOCS row of a filed document and its UMEMO reminders, on the file databases or, in
-// the server build of this program, on PostgreSQL.
+// the server build of this program, on PostgreSQL; and the remark history of its body.
 #include <QtTest>
 
 #include "archive/date_values.h"
 #include "archive/docs_row.h"
-#include "archive/memo.h"
 #include "archive/next_doc_id.h"
 #include "archive/remark.h"
-#include "data/database.h"
-#include "data/recordset.h"
 #include "data/values.h"
 #include "filing_fixture.h"
 #include "sample_install/test_server.h"
@@ -17,104 +14,101 @@
 
 using namespace zv;
 using namespace zv::test;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
 constexpr bool kServer = ZV_ARCHIVE_ON_SERVER;
 
 const QDateTime kNow(QDate(2026, 12, 6), QTime(21, 15, 42));
-const QString kLetter = QStringLiteral("DOCBASIC/מכתבים/letter.docx");
+const QString kLetter = u"DOCBASIC/מכתבים/letter.docx"_s;
 
 DocDetails FullDetails() {
-    DocDetails d;
-    d.handlers = QStringLiteral("דנה כהן;יוסי לוי");
-    d.description = QStringLiteral("מכתב ללקוח");
-    d.moreDescription = QStringLiteral("עותק שני");
-    d.remark = QStringLiteral("נשלח בדואר");
-    d.reminder = true;
-    d.reminderDate = QDate(2026, 12, 20);
-    d.reminderTime = QStringLiteral("9:30");
-    d.popup = true;
-    d.receivedDate = QDate(2026, 12, 1);
-    d.createdDate = QDate(2026, 11, 30);
-    d.createdUnlocked = true;
-    d.origin = 3;
-    d.status = 4;
-    d.clientNumber = QStringLiteral("1001");
-    d.kindLetter = QStringLiteral("N");
-    d.subKind = QStringLiteral("7");
-    d.caseNumber = QStringLiteral("55");
-    d.caseCode = QStringLiteral("C-9");
-    return d;
+    return {.handlers = u"דנה כהן;יוסי לוי"_s,
+            .description = u"מכתב ללקוח"_s,
+            .moreDescription = u"עותק שני"_s,
+            .remark = u"נשלח בדואר"_s,
+            .reminder = true,
+            .reminderDate = QDate(2026, 12, 20),
+            .reminderTime = u"9:30"_s,
+            .popup = true,
+            .receivedDate = QDate(2026, 12, 1),
+            .createdDate = QDate(2026, 11, 30),
+            .createdUnlocked = true,
+            .origin = 3,
+            .status = 4,
+            .clientNumber = u"1001"_s,
+            .kindLetter = u"N"_s,
+            .subKind = u"7"_s,
+            .caseNumber = u"55"_s,
+            .caseCode = u"C-9"_s};
 }
 
 // One way of writing every value, whatever the engine returned.
 QString Text(const QVariant& v) {
     if (v.isNull()) {
-        return QStringLiteral("<null>");
+        return u"<null>"_s;
     }
-    switch (v.typeId()) {
-        case QMetaType::QDateTime:
-        case QMetaType::QDate:
-            return StoredDateTime(v).toString(QStringLiteral("yyyy-MM-dd HH:mm:ss"));
-        case QMetaType::Bool:
-            return v.toBool() ? QStringLiteral("1") : QStringLiteral("0");
-        default:
-            return v.toString();
+    if (v.typeId() == QMetaType::QDateTime || v.typeId() == QMetaType::QDate) {
+        return StoredDateTime(v).toString(u"yyyy-MM-dd HH:mm:ss"_s);
     }
+    return v.typeId() == QMetaType::Bool ? QString::number(v.toInt()) : v.toString();
 }
 
-QList<QVariantMap> DocRows(const QString& relPath) {
-    return Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT * FROM DOCS WHERE FULLNAME='") +
-                                             FixQuote(FullName(relPath)) + QLatin1Char('\''));
+// The one row of a path below DOCS; empty unless there is exactly one.
+QVariantMap DocRow(const QString& relPath) {
+    const auto rows =
+        Rows(u"MDOCS"_s, "SELECT * FROM DOCS WHERE FULLNAME='" + FixQuote(FullName(relPath)) + "'");
+    return rows.size() == 1 ? rows[0] : QVariantMap();
 }
 
-QVariant IdOf(const QString& relPath) {
-    return DocRows(relPath).value(0).value(QStringLiteral("ID"));
+// The named columns of a row, joined by "|".
+QString Columns(const QVariantMap& row, const QStringList& names) {
+    QStringList values;
+    for (const QString& name : names) {
+        values << Text(row[name]);
+    }
+    return values.join('|');
 }
 
-QList<QVariantMap> Memos(const QVariant& id) {
-    return Rows(QStringLiteral("BM"), QStringLiteral("SELECT * FROM UMEMO WHERE ID=") +
-                                          id.toString() + QStringLiteral(" ORDER BY MemoNum"));
-}
-
-// "handler/MTYPE/RTYPE" of each reminder row, in the order written.
-QStringList MemoKinds(const QVariant& id) {
+// "handler/MTYPE/RTYPE" of each reminder row of a document, in the order written.
+QStringList Memos(const QVariant& id) {
     QStringList out;
-    for (const auto& m : Memos(id)) {
-        out << Text(m[QStringLiteral("METAPEL")]) + QLatin1Char('/') +
-                   Text(m[QStringLiteral("MTYPE")]) + QLatin1Char('/') +
-                   Text(m[QStringLiteral("RTYPE")]);
+    for (const auto& m :
+         Rows(u"BM"_s, "SELECT * FROM UMEMO WHERE ID=" + id.toString() + " ORDER BY MemoNum")) {
+        out << Columns(m, {"METAPEL", "MTYPE", "RTYPE"}).replace('|', '/');
     }
     return out;
 }
 
-qint64 MaxDocId() {
-    const auto rows =
-        Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT max(ID) AS M FROM DOCS"));
-    return rows.front()[QStringLiteral("M")].toLongLong();
-}
+struct Reminder {
+    QString handlers;
+    bool reminder;
+    QDate date;
+    QString time;
+    bool popup;
+    QString columns;    // IsMemo|MemoDate|MemoHour|IsJumpMemo
+    QStringList memos;  // handler/MTYPE/RTYPE
+    QDateTime moment;   // of every reminder row
+};
 
 }  // namespace
+
+Q_DECLARE_METATYPE(Reminder)
 
 class TestDocsRow : public QObject {
     Q_OBJECT
   private Q_SLOTS:
     void initTestCase();
     void newRow();
-    void refiling_data();
     void refiling();
     void reminders_data();
     void reminders();
     void untickRemovesOnlyOwnReminders();
-    void idReadingZeroIsReported();
-    void missingColumn_data();
     void missingColumn();
-    void identifiers();
     void notSavedEndsSilently();
     void backEndsChosenApart();
-
-  private:
+    void remarkHistory();
 };
 
 void TestDocsRow::initTestCase() {
@@ -124,46 +118,41 @@ void TestDocsRow::initTestCase() {
     }
 }
 
+// Every column of a new row. The file databases number the first document of an empty table
+// 1; on the server the server numbers it and the add-in asks for nothing.
 void TestDocsRow::newRow() {
     FilingFixture f(kServer);
     SetClock([] { return kNow; });
-    const qint64 maxBefore = MaxDocId();
+    Execute(u"MDOCS"_s, u"DELETE FROM DOCS"_s);
+    QCOMPARE(GetNextIdDOCS(), kServer ? 0 : 1);
     const DocDetails d = FullDetails();
 
     QVERIFY(AddDocToListByAddIn(f.ArchiveFile(kLetter), &d));
 
     QVERIFY(f.Ui().Texts().isEmpty());
-    const QVariantMap row = DocRows(kLetter).value(0);
-    QCOMPARE(row[QStringLiteral("ID")].toLongLong(), maxBefore + 1);
+    const QVariantMap row = DocRow(kLetter);
+    QVERIFY(kServer ? row["ID"].toLongLong() > 0 : row["ID"].toLongLong() == 1);
     const QString user = MyUserName();
     const QStringList expected =
-        (QStringLiteral("FULLNAME=\\DOCS\\DOCBASIC\\מכתבים\\letter.docx|SHORTNAME=letter.docx|"
-                        "DIRPATH=\\DOCS\\DOCBASIC\\מכתבים\\|DIRMONE=0|SOURCE=9|ISMEMO=0|"
-                        "DATECREATED=2026-11-30 00:00:00|METAPEL=דנה כהן;יוסי לוי|"
-                        "TEUR=מכתב ללקוח|SECTEUR=עותק שני|MEMODATE=2026-12-20 00:00:00|"
-                        "MEMOHOUR=09:30|ISJUMPMEMO=1|RECIEVEDATE=2026-12-01 00:00:00|"
-                        "LASTMODIFICATIONTIME=2026-12-06 21:15:42|PARTOF=3|STATUS=4|"
-                        "CLIENT_NUM=1001|SUG=N|IDTIK=7|TIK=55|NUM=C-9|LASTMODIFICATIONUSER=") +
-         user + QStringLiteral("|BODY=") + RemarkStamp(kNow, user) +
-         QStringLiteral(" -- נשלח בדואר"))
-            .split(QLatin1Char('|'));
+        ("FULLNAME=\\DOCS\\DOCBASIC\\מכתבים\\letter.docx|SHORTNAME=letter.docx|"
+         "DIRPATH=\\DOCS\\DOCBASIC\\מכתבים\\|DIRMONE=0|SOURCE=9|ISMEMO=0|"
+         "DATECREATED=2026-11-30 00:00:00|METAPEL=דנה כהן;יוסי לוי|TEUR=מכתב ללקוח|"
+         "SECTEUR=עותק שני|MEMODATE=2026-12-20 00:00:00|MEMOHOUR=09:30|ISJUMPMEMO=1|"
+         "RECIEVEDATE=2026-12-01 00:00:00|LASTMODIFICATIONTIME=2026-12-06 21:15:42|PARTOF=3|"
+         "STATUS=4|CLIENT_NUM=1001|SUG=N|IDTIK=7|TIK=55|NUM=C-9|LASTMODIFICATIONUSER=" +
+         user + "|BODY=" + RemarkStamp(kNow, user) + " -- נשלח בדואר")
+            .split('|');
     for (const QString& column : expected) {
-        const QString name = column.section(QLatin1Char('='), 0, 0);
+        const QString name = column.section('=', 0, 0);
         QVERIFY2(row.contains(name), qPrintable(name));
-        QCOMPARE(name + QLatin1Char('=') + Text(row[name]), column);
+        QCOMPARE(name + '=' + Text(row[name]), column);
     }
 }
 
-void TestDocsRow::refiling_data() {
-    QTest::addColumn<QString>("relPath");
-    QTest::newRow("plain name") << kLetter;
-    QTest::newRow("apostrophe") << QStringLiteral("DOCBASIC/חוזים/O'Brien's deal.pdf");
-}
-
 // Filing to a path that has a row updates it: one row, its ID kept, the remarks kept in
-// order under lines of dashes; a remark of blanks adds nothing.
+// order under lines of dashes; a remark of blanks adds nothing. The path needs quoting.
 void TestDocsRow::refiling() {
-    QFETCH(QString, relPath);
+    const QString relPath = u"DOCBASIC/חוזים/O'Brien's deal.pdf"_s;
     FilingFixture f(kServer);
     const QString path = f.ArchiveFile(relPath);
     DocDetails d = FullDetails();
@@ -171,94 +160,67 @@ void TestDocsRow::refiling() {
     const QDateTime second(QDate(2026, 12, 7), QTime(17, 30, 2));
 
     SetClock([&] { return first; });
-    d.remark = QStringLiteral("ראשון");
+    d.remark = u"ראשון"_s;
     QVERIFY(AddDocToListByAddIn(path, &d));
-    const QVariant id = IdOf(relPath);
+    const QVariant id = DocRow(relPath)["ID"];
     SetClock([&] { return second; });
-    d.remark = QStringLiteral("שני");
-    d.description = QStringLiteral("תיאור חדש");
+    d.remark = u"שני"_s;
+    d.description = u"תיאור חדש"_s;
     QVERIFY(AddDocToListByAddIn(path, &d));
-    d.remark = QStringLiteral("   ");
+    d.remark = u"   "_s;
     QVERIFY(AddDocToListByAddIn(path, &d));
 
     QVERIFY(f.Ui().Texts().isEmpty());
-    const auto rows = DocRows(relPath);
-    QCOMPARE(rows.size(), 1);
-    const QVariantMap& row = rows.front();
-    QCOMPARE(row[QStringLiteral("ID")], id);
-    QCOMPARE(row[QStringLiteral("TEUR")].toString(), d.description);
+    const QVariantMap row = DocRow(relPath);
+    QCOMPARE(row["ID"], id);
+    QCOMPARE(row["TEUR"].toString(), d.description);
     const QString user = MyUserName();
-    QCOMPARE(row[QStringLiteral("BODY")].toString(),
-             RemarkStamp(first, user) + QStringLiteral(" -- ראשון\r\n") +
-                 QString(60, QLatin1Char('-')) + QStringLiteral("\r\n") +
-                 RemarkStamp(second, user) + QStringLiteral(" -- שני"));
+    QCOMPARE(row["BODY"].toString(), RemarkStamp(first, user) + " -- ראשון\r\n" + QString(60, '-') +
+                                         "\r\n" + RemarkStamp(second, user) + " -- שני");
 }
 
 void TestDocsRow::reminders_data() {
-    QTest::addColumn<QString>("handlers");
-    QTest::addColumn<bool>("reminder");
-    QTest::addColumn<QDate>("date");
-    QTest::addColumn<QString>("time");
-    QTest::addColumn<bool>("popup");
-    QTest::addColumn<QStringList>("columns");  // IsMemo, MemoDate, MemoHour, IsJumpMemo
-    QTest::addColumn<QStringList>("memos");    // handler/MTYPE/RTYPE
-    QTest::addColumn<QDateTime>("moment");     // of every reminder row
-
+    QTest::addColumn<Reminder>("r");
     const QDate day(2026, 12, 20);
-    const QString midnight = QStringLiteral("2026-12-20 00:00:00");
+    const QString on = u"0|2026-12-20 00:00:00|"_s;
     const QDateTime at(day, QTime(10, 0));
-    QTest::newRow("off") << "A" << false << day << "10:00" << true
-                         << QStringList{"1", "<null>", "<null>", "0"} << QStringList{} << at;
-    QTest::newRow("on") << "A" << true << day << "10:00" << false
-                        << QStringList{"0", midnight, "10:00", "0"} << QStringList{"A/32/3"} << at;
+    QTest::newRow("off") << Reminder{"A", false, day, "10:00", true, "1|<null>|<null>|0", {}, at};
     QTest::newRow("empty time mask is 08:00")
-        << "A" << true << day << "__:__" << false << QStringList{"0", midnight, "08:00", "0"}
-        << QStringList{"A/32/3"} << QDateTime(day, QTime(8, 0));
+        << Reminder{"A", true, day, "__:__", false, on + "08:00|0", {"A/32/3"}, {day, QTime(8, 0)}};
     QTest::newRow("empty date box is the zero date")
-        << "A" << true << QDate() << "10:00" << true
-        << QStringList{"0", "1899-12-30 00:00:00", "10:00", "1"} << QStringList{} << at;
-    QTest::newRow("two handlers, pop-up first")
-        << "A;B" << true << day << "10:00" << true << QStringList{"0", midnight, "10:00", "1"}
-        << QStringList{"A/31/2", "B/31/2", "A/32/3", "B/32/3"} << at;
-    QTest::newRow("trailing separator gives an empty handler")
-        << "A;" << true << day << "10:00" << true << QStringList{"0", midnight, "10:00", "1"}
-        << QStringList{"A/31/2", "/31/2", "A/32/3", "/32/3"} << at;
-    QTest::newRow("24:30 is the next day")
-        << "A" << true << day << "24:30" << false << QStringList{"0", midnight, "24:30", "0"}
-        << QStringList{"A/32/3"} << QDateTime(QDate(2026, 12, 21), QTime(0, 30));
+        << Reminder{"A", true, {}, "10:00", true, "0|1899-12-30 00:00:00|10:00|1", {}, at};
+    QTest::newRow("two handlers, pop-up first") << Reminder{
+        "A;B", true, day, "10:00", true, on + "10:00|1", {"A/31/2", "B/31/2", "A/32/3", "B/32/3"},
+        at};
+    QTest::newRow("trailing separator gives an empty handler") << Reminder{
+        "A;", true, day, "10:00", true, on + "10:00|1", {"A/31/2", "/31/2", "A/32/3", "/32/3"}, at};
+    // A time the box cannot read is kept as typed; hours and minutes past their range carry.
+    QTest::newRow("99:99 is four days on") << Reminder{
+        "A", true, day, "99:99", false, on + "99:99|0", {"A/32/3"}, {day.addDays(4), QTime(4, 39)}};
+    QTest::newRow("no time, no reminder rows")
+        << Reminder{"A", true, day, "8:0x", true, on + "8:0x|1", {}, at};
 }
 
 void TestDocsRow::reminders() {
-    QFETCH(QString, handlers);
-    QFETCH(bool, reminder);
-    QFETCH(QDate, date);
-    QFETCH(QString, time);
-    QFETCH(bool, popup);
-    QFETCH(QStringList, columns);
-    QFETCH(QStringList, memos);
-    QFETCH(QDateTime, moment);
+    QFETCH(Reminder, r);
     FilingFixture f(kServer);
     SetClock([] { return kNow; });
     DocDetails d = FullDetails();
-    d.handlers = handlers;
-    d.reminder = reminder;
-    d.reminderDate = date;
-    d.reminderTime = time;
-    d.popup = popup;
+    d.handlers = r.handlers;
+    d.reminder = r.reminder;
+    d.reminderDate = r.date;
+    d.reminderTime = r.time;
+    d.popup = r.popup;
 
     QVERIFY(AddDocToListByAddIn(f.ArchiveFile(kLetter), &d));
 
     QVERIFY(f.Ui().Texts().isEmpty());
-    const QVariantMap row = DocRows(kLetter).value(0);
-    const QStringList got{
-        Text(row[QStringLiteral("ISMEMO")]), Text(row[QStringLiteral("MEMODATE")]),
-        Text(row[QStringLiteral("MEMOHOUR")]), Text(row[QStringLiteral("ISJUMPMEMO")])};
-    QCOMPARE(got, columns);
-    QCOMPARE(MemoKinds(row[QStringLiteral("ID")]), memos);
-    for (const auto& m : Memos(row[QStringLiteral("ID")])) {
-        QCOMPARE(m[QStringLiteral("USER97")].toString(), MyUser());
-        QCOMPARE(Text(m[QStringLiteral("MEMOTIME")]), Text(moment));
-        QCOMPARE(Text(m[QStringLiteral("DATEUPDATED")]), Text(kNow));
+    const QVariantMap row = DocRow(kLetter);
+    QCOMPARE(Columns(row, {"ISMEMO", "MEMODATE", "MEMOHOUR", "ISJUMPMEMO"}), r.columns);
+    QCOMPARE(Memos(row["ID"]), r.memos);
+    const QString each = MyUser() + '|' + Text(r.moment) + '|' + Text(kNow);
+    for (const auto& m : Rows(u"BM"_s, "SELECT * FROM UMEMO WHERE ID=" + row["ID"].toString())) {
+        QCOMPARE(Columns(m, {"USER97", "MEMOTIME", "DATEUPDATED"}), each);
     }
 }
 
@@ -268,108 +230,66 @@ void TestDocsRow::untickRemovesOnlyOwnReminders() {
     FilingFixture f(kServer);
     const QString path = f.ArchiveFile(kLetter);
     DocDetails d = FullDetails();
-    d.handlers = QStringLiteral("A");
+    d.handlers = u"A"_s;
     QVERIFY(AddDocToListByAddIn(path, &d));
-    const QString id = IdOf(kLetter).toString();
-    const QString insert = QStringLiteral(
-        "INSERT INTO UMEMO (USER97, METAPEL, MTYPE, RTYPE, ID) VALUES ('1', 'A', %1, 2, %2)");
-    Execute(QStringLiteral("BM"), insert.arg(QStringLiteral("7"), id));
-    Execute(QStringLiteral("BM"), insert.arg(QStringLiteral("31"), QStringLiteral("99999")));
-    QCOMPARE(MemoKinds(id), (QStringList{"A/31/2", "A/32/3", "A/7/2"}));
+    const QString id = DocRow(kLetter)["ID"].toString();
+    const QString insert =
+        u"INSERT INTO UMEMO (USER97, METAPEL, MTYPE, RTYPE, ID) VALUES ('1', 'A', %1, 2, %2)"_s;
+    Execute(u"BM"_s, insert.arg(u"7"_s, id));
+    Execute(u"BM"_s, insert.arg(u"31"_s, u"99999"_s));
+    QCOMPARE(Memos(id), (QStringList{"A/31/2", "A/32/3", "A/7/2"}));
 
     d.reminder = false;
     QVERIFY(AddDocToListByAddIn(path, &d));
 
-    QCOMPARE(MemoKinds(id), QStringList{"A/7/2"});
-    QCOMPARE(MemoKinds(99999), QStringList{"A/31/2"});
-    QCOMPARE(Text(DocRows(kLetter).value(0)[QStringLiteral("ISMEMO")]), QStringLiteral("1"));
+    QCOMPARE(Memos(id), QStringList{"A/7/2"});
+    QCOMPARE(Memos(99999), QStringList{"A/31/2"});
+    QCOMPARE(Text(DocRow(kLetter)["ISMEMO"]), u"1"_s);
     QVERIFY(f.Ui().Texts().isEmpty());
-}
-
-void TestDocsRow::idReadingZeroIsReported() {
-    FilingFixture f(kServer);
-    Execute(QStringLiteral("MDOCS"),
-            QStringLiteral("INSERT INTO DOCS (ID, FULLNAME, IsMemo, IsJumpMemo, MemoDate, "
-                           "MemoHour, Metapel) VALUES (0, '\\zero.doc', 0, 1, "
-                           "'2026-12-20 00:00:00', '09:00', 'A')"));
-    auto db = Database::Open(QStringLiteral("MDOCS"), IsDocs());
-    auto rs = db->OpenRecordset(QStringLiteral("SELECT * FROM DOCS WHERE FULLNAME='\\zero.doc'"));
-
-    CheckMemo(QStringLiteral("DOCS"), rs.get());
-
-    QCOMPARE(f.Ui().Texts(), QStringList{QStringLiteral("בעיה בקוד זיהוי בטבלה : DOCS")});
-    QVERIFY(Memos(0).isEmpty());
-}
-
-void TestDocsRow::missingColumn_data() {
-    QTest::addColumn<QString>("database");
-    QTest::addColumn<QString>("statement");
-    QTest::addColumn<QString>("message");  // %1: the file, %2: its ID
-    QTest::newRow("DOCS") << "MDOCS"
-                          << "ALTER TABLE DOCS DROP COLUMN SecTeur"
-                          << "3265-0-AddDocToListByAddIn-Item not found in this collection. "
-                             "(SecTeur)\r\n%1";
-    QTest::newRow("UMEMO")
-        << "BM"
-        << "ALTER TABLE UMEMO DROP COLUMN DateUpdated"
-        << " 3265-CheckMemo-\r\nDOCS-%2\r\nItem not found in this collection. (DateUpdated)";
 }
 
 // A column a table lacks is reported; the rest of the row and the reminders are saved.
 void TestDocsRow::missingColumn() {
-    QFETCH(QString, database);
-    QFETCH(QString, statement);
-    QFETCH(QString, message);
-    FilingFixture f(kServer);
-    Execute(database, statement);
-    DocDetails d = FullDetails();
-    d.handlers = QStringLiteral("A");
-    d.popup = false;
-    const QString path = f.ArchiveFile(kLetter);
+    const struct {
+        QString database, statement, message;  // %1: the file, %2: its ID
+    } cases[] = {
+        {"MDOCS", "ALTER TABLE DOCS DROP COLUMN SecTeur",
+         "3265-0-AddDocToListByAddIn-Item not found in this collection. (SecTeur)\r\n%1"},
+        {"BM", "ALTER TABLE UMEMO DROP COLUMN DateUpdated",
+         " 3265-CheckMemo-\r\nDOCS-%2\r\nItem not found in this collection. (DateUpdated)"}};
+    for (const auto& c : cases) {
+        FilingFixture f(kServer);
+        Execute(c.database, c.statement);
+        DocDetails d = FullDetails();
+        d.handlers = u"A"_s;
+        d.popup = false;
+        const QString path = f.ArchiveFile(kLetter);
 
-    QVERIFY(AddDocToListByAddIn(path, &d));
+        QVERIFY(AddDocToListByAddIn(path, &d));
 
-    const QVariantMap row = DocRows(kLetter).value(0);
-    message.replace(QStringLiteral("%1"), path)
-        .replace(QStringLiteral("%2"), row[QStringLiteral("ID")].toString());
-    QCOMPARE(f.Ui().Texts(), QStringList{message});
-    QCOMPARE(row[QStringLiteral("NUM")].toString(), d.caseCode);
-    QCOMPARE(MemoKinds(row[QStringLiteral("ID")]), QStringList{"A/32/3"});
-}
-
-// The file databases number documents max + 1 (1 in an empty table); on the server the server
-// numbers them and the add-in asks for nothing.
-void TestDocsRow::identifiers() {
-    FilingFixture f(kServer);
-    Execute(QStringLiteral("MDOCS"), QStringLiteral("DELETE FROM DOCS"));
-    QCOMPARE(GetNextIdDOCS(), kServer ? 0 : 1);
-    const DocDetails d = FullDetails();
-    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/a.pdf")), &d));
-    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/b.pdf")), &d));
-    const qint64 a = IdOf(QStringLiteral("MAILIN/a.pdf")).toLongLong();
-    QVERIFY(a > 0);
-    QCOMPARE(IdOf(QStringLiteral("MAILIN/b.pdf")).toLongLong(), a + 1);
-    QVERIFY(kServer || a == 1);
-    QVERIFY(f.Ui().Texts().isEmpty());
+        const QVariantMap row = DocRow(kLetter);
+        QCOMPARE(
+            f.Ui().Texts(),
+            QStringList{
+                QString(c.message).replace(u"%1"_s, path).replace(u"%2"_s, row["ID"].toString())});
+        QCOMPARE(row["NUM"].toString(), d.caseCode);
+        QCOMPARE(Memos(row["ID"]), QStringList{"A/32/3"});
+    }
 }
 
 // A filing whose row cannot be saved says so and ends silently: a file that is gone, and a
 // duplicate in an index other than ID, which is no identifier race and takes no second one.
 void TestDocsRow::notSavedEndsSilently() {
     FilingFixture f(kServer);
-    Execute(QStringLiteral("MDOCS"),
-            QStringLiteral("CREATE UNIQUE INDEX DOCS_SHORTNAME ON DOCS (ShortName)"));
-    const qint64 before = MaxDocId();
+    Execute(u"MDOCS"_s, u"CREATE UNIQUE INDEX DOCS_SHORTNAME ON DOCS (ShortName)"_s);
+    const qint64 before = Rows(u"MDOCS"_s, u"SELECT max(ID) AS M FROM DOCS"_s)[0]["M"].toLongLong();
     const DocDetails d = FullDetails();
-    QVERIFY(!AddDocToListByAddIn(f.Docs() + QStringLiteral("/MAILIN/gone.pdf"), &d));
-    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/same.pdf")), &d));
-    QVERIFY(!AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("DOCBASIC/same.pdf")), &d));
+    QVERIFY(!AddDocToListByAddIn(f.Docs() + u"/MAILIN/gone.pdf"_s, &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(u"MAILIN/same.pdf"_s), &d));
+    QVERIFY(!AddDocToListByAddIn(f.ArchiveFile(u"DOCBASIC/same.pdf"_s), &d));
 
     QVERIFY(f.Ui().Texts().isEmpty());
-    const auto added =
-        Rows(QStringLiteral("MDOCS"),
-             QStringLiteral("SELECT ID FROM DOCS WHERE ID>") + QString::number(before));
-    QCOMPARE(added.size(), 1);
+    QCOMPARE(Rows(u"MDOCS"_s, "SELECT ID FROM DOCS WHERE ID>" + QString::number(before)).size(), 1);
     if (!kServer) {
         QCOMPARE(GetNextIdDOCS(), before + 2);
     }
@@ -382,14 +302,24 @@ void TestDocsRow::backEndsChosenApart() {
     }
     FilingFixture f(true, false);
     const DocDetails d = FullDetails();
-    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(QStringLiteral("MAILIN/first.pdf")), &d));
+    QVERIFY(AddDocToListByAddIn(f.ArchiveFile(u"MAILIN/first.pdf"_s), &d));
     QVERIFY(AddDocToListByAddIn(f.ArchiveFile(kLetter), &d));
 
-    const QVariant first = IdOf(QStringLiteral("MAILIN/first.pdf"));
-    QVERIFY(first != IdOf(kLetter));
+    const QVariant first = DocRow(u"MAILIN/first.pdf"_s)["ID"];
+    QVERIFY(first != DocRow(kLetter)["ID"]);
     QCOMPARE(Memos(first).size(), 4);
-    QCOMPARE(Memos(IdOf(kLetter)).size(), 4);
+    QCOMPARE(Memos(DocRow(kLetter)["ID"]).size(), 4);
     QVERIFY(f.Ui().Texts().isEmpty());
+}
+
+// The test runs in the en_US locale (set by CMake): short date M/d/yy, long time
+// h:mm:ss AP, and no time zone in the stamp.
+void TestDocsRow::remarkHistory() {
+    TestEnv env;
+    SetMyUserName(u"דנה כהן"_s);
+    SetClock([] { return QDateTime(QDate(2026, 3, 1), QTime(21, 30)); });
+    QCOMPARE(AppendRemark(u"first"_s, u"נשלח ללקוח"_s),
+             "first\r\n" + QString(60, '-') + "\r\n3/1/26 9:30:00 PM (דנה כהן) -- נשלח ללקוח");
 }
 
 QTEST_MAIN(TestDocsRow)

@@ -4,31 +4,45 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QLineEdit>
+#include <QPushButton>
 #include <QtTest>
 
-#include "dialog_script.h"
 #include "dialogs/frm_save_as.h"
 #include "filing_fixture.h"
 #include "sample_install/test_server.h"
 
 using namespace zv;
 using namespace zv::test;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
 constexpr bool kServer = ZV_FILING_ON_SERVER;
-const QString kSaved = QStringLiteral("הקובץ נשמר לכתובת המבוקשת");
+const QString kSaved = u"הקובץ נשמר לכתובת המבוקשת"_s;
+const QString kCancel = u"<cancel>"_s;
+
+// One request on the client 1001: mode, source, suggested name, the name typed (none: the
+// proposal stays), files already in the client's folder, the name given in each save-as
+// shown (empty: keep it; kCancel: cancel), the file archived (empty: nothing is filed), and
+// whether the filing dialog is confirmed.
+struct Case {
+    int mode;
+    QString source, suggested;
+    std::optional<QString> typed;
+    QStringList existing, renames;
+    QString expected;
+    bool confirm = true;
+};
 
 }  // namespace
+
+Q_DECLARE_METATYPE(Case)
 
 class TestFilingWindow : public QObject {
     Q_OBJECT
   private Q_SLOTS:
     void initTestCase();
-    void documentFiled_data();
     void documentFiled();
-    void cancelled_data();
-    void cancelled();
     void filed_data();
     void filed();
     void sourceThatCannotBeDeleted();
@@ -41,46 +55,32 @@ void TestFilingWindow::initTestCase() {
     }
 }
 
-void TestFilingWindow::documentFiled_data() {
-    QTest::addColumn<QString>("tik");
-    QTest::addColumn<QStringList>("expected");  // folder, SUG, NUM
-    QTest::newRow("client") << QString() << QStringList{"DOC1001", "F", ""};
-    QTest::newRow("case") << "2" << QStringList{"DOC1001/W/2", "W", "1001-2"};
-}
-
+// A case chosen in the dialog: the file goes to its folder, and what the user filled in
+// reaches the row and its reminders.
 void TestFilingWindow::documentFiled() {
-    QFETCH(QString, tik);
-    QFETCH(QStringList, expected);
     FilingFixture f(kServer);
-    const QString source = f.Source(QStringLiteral("letter.docx"), "body");
-    QueueFilingDialog(f.Ui(), {.client = QStringLiteral("1001"),
-                               .tik = tik,
-                               .description = QStringLiteral("חוזה"),
-                               .remark = QStringLiteral("נשלח בדואר"),
-                               .reminder = true,
-                               .reminderTime = QStringLiteral("09:15"),
+    const QString source = f.Source(u"letter.docx"_s, "body");
+    QueueFilingDialog(f.Ui(), {.tik = u"2"_s,
+                               .description = u"חוזה"_s,
+                               .remark = u"נשלח בדואר"_s,
+                               .reminderTime = u"09:15"_s,
                                .popup = true});
 
-    const QString archived = f.RunWithDialog(1, source, QStringLiteral("מכתב: <ללקוח>"));
+    const QString archived = f.RunWithDialog(1, source, u"מכתב: <ללקוח>"_s);
 
-    const QString rel = expected[0] + QStringLiteral("/מכתב ללקוח.docx");
-    QCOMPARE(archived, f.Docs() + QLatin1Char('/') + rel);
+    QCOMPARE(archived, f.Docs() + u"/DOC1001/W/2/מכתב ללקוח.docx"_s);
     QCOMPARE(Content(archived), QByteArray("body"));
     QVERIFY(!QFile::exists(source));
     const auto rows = f.DocsRows();
     QCOMPARE(rows.size(), 1);
     const QVariantMap& row = rows.first();
-    const QMap<QString, QString> columns{
-        {"FULLNAME", FullName(rel)}, {"CLIENT_NUM", "1001"}, {"SUG", expected[1]}, {"TIK", tik},
-        {"NUM", expected[2]},        {"TEUR", "חוזה"},       {"PARTOF", "2"},      {"STATUS", "2"},
-        {"MEMOHOUR", "09:15"}};
-    for (auto it = columns.cbegin(); it != columns.cend(); ++it) {
-        QCOMPARE(row[it.key()].toString(), it.value());
-    }
-    QVERIFY(!row["ISMEMO"].toBool());
-    QVERIFY(row["BODY"].toString().endsWith(QStringLiteral(" -- נשלח בדואר")));
-    const auto memos = Rows(QStringLiteral("BM"),
-                            QStringLiteral("SELECT * FROM UMEMO WHERE ID=") + row["ID"].toString());
+    QCOMPARE(QStringList({row["FULLNAME"].toString(), row["CLIENT_NUM"].toString(),
+                          row["SUG"].toString(), row["TIK"].toString(), row["NUM"].toString(),
+                          row["TEUR"].toString(), row["MEMOHOUR"].toString()}),
+             QStringList({FullName(u"DOC1001/W/2/מכתב ללקוח.docx"_s), "1001", "W", "2", "1001-2",
+                          "חוזה", "09:15"}));
+    QVERIFY(row["BODY"].toString().endsWith(u" -- נשלח בדואר"_s));
+    const auto memos = Rows(u"BM"_s, "SELECT * FROM UMEMO WHERE ID=" + row["ID"].toString());
     QCOMPARE(memos.size(), 2);  // the pop-up and the regular reminder of the one handler
     for (const QVariantMap& memo : memos) {
         QCOMPARE(memo["MEMOTIME"].toDateTime(),
@@ -90,151 +90,104 @@ void TestFilingWindow::documentFiled() {
     QCOMPARE(f.Ui().UnexpectedModals(), 0);
 }
 
-void TestFilingWindow::cancelled_data() {
-    QTest::addColumn<int>("mode");
-    QTest::addColumn<bool>("confirm");
-    QTest::addColumn<bool>("atSaveAs");
-    QTest::newRow("filing dialog closed") << 1 << false << false;
-    QTest::newRow("save-as cancelled") << 1 << true << true;
-    QTest::newRow("mode 3 files nothing") << 3 << true << false;
-}
-
-void TestFilingWindow::cancelled() {
-    QFETCH(int, mode);
-    QFETCH(bool, confirm);
-    QFETCH(bool, atSaveAs);
-    FilingFixture f(kServer);
-    const QString source = f.Source(QStringLiteral("scan.pdf"), "new");
-    const QString existing = f.ArchiveFile(QStringLiteral("DOC1001/מכתב.pdf"), "old");
-    DialogInput in{.client = QStringLiteral("1001")};
-    in.confirm = confirm;
-    QueueFilingDialog(f.Ui(), in);
-    if (atSaveAs) {
-        QueueSaveAs(f.Ui(), {}, std::nullopt, true);
-    }
-
-    QCOMPARE(f.RunWithDialog(mode, source, QStringLiteral("מכתב")), QString());
-
-    QCOMPARE(Content(source), QByteArray("new"));
-    QCOMPARE(Content(existing), QByteArray("old"));
-    QCOMPARE(FolderEntries(f.Docs() + QStringLiteral("/DOC1001")), QStringList{"מכתב.pdf"});
-    QVERIFY(f.DocsRows().isEmpty());
-    QVERIFY(f.Ui().Texts().isEmpty());
-    QCOMPARE(f.Ui().UnexpectedModals(), 0);
-}
-
 void TestFilingWindow::filed_data() {
-    QTest::addColumn<int>("mode");
-    QTest::addColumn<QString>("sourceName");
-    QTest::addColumn<QString>("suggested");
-    QTest::addColumn<QString>("typed");         // null: the proposal stays in the name box
-    QTest::addColumn<QStringList>("existing");  // files already in the client's folder
-    QTest::addColumn<QStringList>("renames");   // one per save-as shown; empty: keep the name
-    QTest::addColumn<QString>("expected");
-    const QString subject = QStringLiteral("נושא: פגישה");
-    const QString none;
-    QTest::newRow("clash replaced")
-        << 1 << "scan.pdf"
-        << "מכתב" << none << QStringList{"מכתב.pdf"} << QStringList{""} << "מכתב.pdf";
-    QTest::newRow("clash renamed")
-        << 1 << "scan.pdf"
-        << "מכתב" << none << QStringList{"מכתב.pdf"} << QStringList{"מכתב: שני"} << "מכתב שני.pdf";
+    QTest::addColumn<Case>("c");
+    const QString scan = u"scan.pdf"_s, letter = u"מכתב"_s, subject = u"נושא: פגישה"_s;
+    const QStringList old{u"מכתב.pdf"_s};
+    QTest::newRow("filing dialog closed") << Case{1, scan, letter, {}, old, {}, {}, false};
+    QTest::newRow("save-as cancelled") << Case{1, scan, letter, {}, old, {kCancel}, {}};
+    QTest::newRow("mode 3 files nothing") << Case{3, scan, letter, {}, old, {}, {}};
+    QTest::newRow("clash replaced") << Case{1, scan, letter, {}, old, {""}, "מכתב.pdf"};
+    QTest::newRow("clash renamed") << Case{1, scan, letter, {}, old, {"מכתב: שני"}, "מכתב שני.pdf"};
     // A new name that clashes too is asked about again, not silently replaced.
     QTest::newRow("renamed onto another file, then renamed")
-        << 1 << "scan.pdf"
-        << "מכתב" << none << QStringList{"מכתב.pdf", "אחר.pdf"} << QStringList{"אחר", "שלישי"}
-        << "שלישי.pdf";
+        << Case{1, scan, letter, {}, {"מכתב.pdf", "אחר.pdf"}, {"אחר", "שלישי"}, "שלישי.pdf"};
     QTest::newRow("source without extension")
-        << 1 << "README"
-        << "קרא אותי" << none << QStringList() << QStringList() << "קרא אותי";
-    QTest::newRow("mail, empty name")
-        << 2 << "m.msg" << subject << "" << QStringList() << QStringList() << "נושא פגישה.msg";
+        << Case{1, "README", "קרא אותי", {}, {}, {}, "קרא אותי"};
+    QTest::newRow("mail, empty name") << Case{2, "m.msg", subject, "", {}, {}, "נושא פגישה.msg"};
     QTest::newRow("mail, name differing in case only")
-        << 2 << "m.msg"
-        << "Meeting notes"
-        << "MEETING NOTES" << QStringList() << QStringList() << "Meeting notes.msg";
+        << Case{2, "m.msg", "Meeting notes", "MEETING NOTES", {}, {}, "Meeting notes.msg"};
     QTest::newRow("mail, name of its own")
-        << 2 << "m.msg" << subject << "סיכום" << QStringList() << QStringList() << "סיכום.msg";
+        << Case{2, "m.msg", subject, "סיכום", {}, {}, "סיכום.msg"};
     QTest::newRow("mail, upper-case .MSG source")
-        << 2 << "m.MSG" << subject << none << QStringList() << QStringList() << "נושא פגישה.msg";
-    QTest::newRow("mail, .eml source") << 2 << "m.eml" << subject << none << QStringList()
-                                       << QStringList() << "נושא פגישה.msg.eml";
-    QTest::newRow("mail, name with an apostrophe")
-        << 2 << "m.msg" << subject << "O'Neil" << QStringList() << QStringList() << "O'Neil.msg";
+        << Case{2, "m.MSG", subject, {}, {}, {}, "נושא פגישה.msg"};
+    QTest::newRow("mail, .eml source")
+        << Case{2, "m.eml", subject, {}, {}, {}, "נושא פגישה.msg.eml"};
     // The earlier mail of the same subject is found under its final name and kept.
-    QTest::newRow("mail, .eml clash")
-        << 2 << "m.eml" << subject << none << QStringList{"נושא פגישה.msg.eml"}
-        << QStringList{"נושא פגישה 2"} << "נושא פגישה 2.msg.eml";
+    QTest::newRow("mail, .eml clash") << Case{
+        2, "m.eml", subject, {}, {"נושא פגישה.msg.eml"}, {"נושא פגישה 2"}, "נושא פגישה 2.msg.eml"};
 }
 
 void TestFilingWindow::filed() {
-    QFETCH(int, mode);
-    QFETCH(QString, sourceName);
-    QFETCH(QString, suggested);
-    QFETCH(QString, typed);
-    QFETCH(QStringList, existing);
-    QFETCH(QStringList, renames);
-    QFETCH(QString, expected);
+    QFETCH(Case, c);
     FilingFixture f(kServer);
-    const QString source = f.Source(sourceName, "new");
-    for (const QString& name : existing) {
-        f.ArchiveFile(QStringLiteral("DOC1001/") + name, "old, longer");
+    const QString source = f.Source(c.source, "new");
+    for (const QString& name : c.existing) {
+        f.ArchiveFile(u"DOC1001/"_s + name, "old, longer");
     }
-    DialogInput in{.client = QStringLiteral("1001")};
-    if (!typed.isNull()) {
-        in.name = typed;
-    }
-    QueueFilingDialog(f.Ui(), in);
+    QueueFilingDialog(f.Ui(), {.confirm = c.confirm, .name = c.typed});
     // The save-as dialog proposes the clashing name, then each name typed before.
-    QString shown = existing.isEmpty() ? QString() : QFileInfo(existing.first()).baseName();
-    for (const QString& rename : renames) {
-        QueueSaveAs(
-            f.Ui(), [shown](FrmSaveAs& s) { QCOMPARE(s.TxtName().text(), shown); },
-            rename.isEmpty() ? std::nullopt : std::optional<QString>(rename));
+    QString shown = c.existing.isEmpty() ? QString() : QFileInfo(c.existing.first()).baseName();
+    for (const QString& rename : c.renames) {
+        f.Ui().QueueModal([shown, rename](QWidget& window) {
+            auto& s = dynamic_cast<FrmSaveAs&>(window);
+            QCOMPARE(s.TxtName().text(), shown);
+            if (!rename.isEmpty() && rename != kCancel) {
+                s.TxtName().setText(rename);
+            }
+            (rename == kCancel ? s.CmdCancel() : s.CmdSave()).click();
+        });
         shown = rename;
     }
 
-    const QString archived = f.RunWithDialog(mode, source, suggested);
+    const QString archived = f.RunWithDialog(c.mode, source, c.suggested);
 
-    QCOMPARE(f.Ui().ModalCount(), 2 + static_cast<int>(renames.size()));
     QCOMPARE(f.Ui().UnexpectedModals(), 0);
-    const QString folder = f.Docs() + QStringLiteral("/DOC1001/");
-    for (const QString& name : existing) {
-        if (name != expected) {
-            QCOMPARE(Content(folder + name), QByteArray("old, longer"));
-        }
+    QCOMPARE(f.Ui().ModalCount(), (c.confirm ? 2 : 1) + static_cast<int>(c.renames.size()));
+    const QString folder = f.Docs() + u"/DOC1001/"_s;
+    const bool filed = !c.expected.isEmpty();
+    QStringList entries = c.existing;
+    for (const QString& name : c.existing) {
+        QVERIFY(name == c.expected || Content(folder + name) == "old, longer");
     }
-    QCOMPARE(archived, folder + expected);
-    QCOMPARE(Content(archived), QByteArray("new"));
-    QVERIFY(!QFile::exists(source));
+    if (filed && !entries.contains(c.expected)) {
+        entries << c.expected;
+    }
+    entries.sort();
+    QCOMPARE(FolderEntries(folder), entries);  // and no copy left half way
+    QCOMPARE(archived, filed ? folder + c.expected : QString());
+    QCOMPARE(Content(filed ? archived : source), QByteArray("new"));
+    QCOMPARE(QFile::exists(source), !filed);
+    QCOMPARE(f.Ui().Texts(), filed ? QStringList{kSaved} : QStringList());
     const auto rows = f.DocsRows();
-    QCOMPARE(rows.size(), 1);
-    QCOMPARE(rows.first()["FULLNAME"].toString(), FullName(QStringLiteral("DOC1001/") + expected));
-    QCOMPARE(rows.first()["PARTOF"].toInt(), mode == 1 ? 2 : 1);
-    QCOMPARE(f.Ui().Texts(), QStringList{kSaved});
+    QCOMPARE(rows.size(), filed ? 1 : 0);
+    if (filed) {
+        QCOMPARE(rows.first()["FULLNAME"].toString(), FullName(u"DOC1001/"_s + c.expected));
+        QCOMPARE(rows.first()["SUG"].toString(), u"F"_s);
+        QCOMPARE(rows.first()["PARTOF"].toInt(), c.mode == 1 ? 2 : 1);
+    }
 }
 
 void TestFilingWindow::sourceThatCannotBeDeleted() {
     FilingFixture f(kServer);
-    const QString source = f.Source(QStringLiteral("x.pdf"), "x");
+    const QString source = f.Source(u"x.pdf"_s, "x");
     Unwritable keep(source);
     if (!keep.Holds()) {
         QSKIP("this file system cannot keep a file from being deleted");
     }
-    QueueFilingDialog(f.Ui(), {.client = QStringLiteral("1001")});
+    QueueFilingDialog(f.Ui(), {});
 
-    const QString archived = f.RunWithDialog(1, source, QStringLiteral("מסמך"));
+    const QString archived = f.RunWithDialog(1, source, u"מסמך"_s);
 
     // The filing stands; the user is told the source is still there.
-    QCOMPARE(archived, f.Docs() + QStringLiteral("/DOC1001/מסמך.pdf"));
+    QCOMPARE(archived, f.Docs() + u"/DOC1001/מסמך.pdf"_s);
     QCOMPARE(f.DocsRows().size(), 1);
     QVERIFY(QFile::exists(source));
     const QStringList texts = f.Ui().Texts();
     QCOMPARE(texts.size(), 2);
     QCOMPARE(texts.at(0), kSaved);
-    QVERIFY2(texts.at(1).startsWith(
-                 QStringLiteral("לא ניתן היה למחוק את קובץ המקור, והוא נשאר במקומו :\r\n") +
-                 source + QStringLiteral("\r\n")),
+    QVERIFY2(texts.at(1).startsWith(u"לא ניתן היה למחוק את קובץ המקור, והוא נשאר במקומו :\r\n"_s +
+                                    source + u"\r\n"_s),
              qPrintable(texts.at(1)));
 }
 

@@ -6,42 +6,75 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <QCheckBox>
+#include <QComboBox>
 #include <QDir>
-#include <QFile>
+#include <QDirIterator>
 #include <QFileInfo>
+#include <QLineEdit>
 #include <QProcess>
-#include <QSqlDatabase>
-#include <QSqlQuery>
-#include <QUuid>
+#include <QPushButton>
+#include <QTableView>
+#include <QTest>
 #include <stdexcept>
 
 #include "filing/filing_request_handler.h"
+#include "filing_dialog/frm_get_doc_det.h"
 #include "sample_install/sample_install.h"
 #include "sample_install/test_server.h"
+#include "selection/list_model.h"
+#include "selection/list_window.h"
 #include "startup/backend_selection.h"
 #include "startup/main_entry.h"
 #include "startup/request_text.h"
 #include "startup/settings.h"
 #include "test_files.h"
 #include "util/clock.h"
-#include "util/state.h"
 
 namespace zv::test {
 namespace {
 
-bool SetImmutable(const QString& path, bool on) {
-    const int fd = ::open(QFile::encodeName(path).constData(), O_RDONLY | O_NONBLOCK);
-    if (fd < 0) {
-        return false;
+QString Written(const QString& path, const QByteArray& content) {
+    if (!WriteFile(path, content)) {
+        throw std::runtime_error("cannot write " + path.toStdString());
     }
-    int flags = 0;
-    bool ok = ::ioctl(fd, FS_IOC_GETFLAGS, &flags) == 0;
-    if (ok) {
-        flags = on ? (flags | FS_IMMUTABLE_FL) : (flags & ~FS_IMMUTABLE_FL);
-        ok = ::ioctl(fd, FS_IOC_SETFLAGS, &flags) == 0;
+    return path;
+}
+
+qsizetype RowCount(const QString& database, const QString& table) {
+    try {
+        return Rows(database, QStringLiteral("SELECT * FROM ") + table).size();
+    } catch (const std::exception&) {
+        return -1;
     }
-    ::close(fd);
-    return ok;
+}
+
+template <class T>
+T& Child(QWidget& w, const char* name) {
+    T* child = w.findChild<T*>(QLatin1String(name));
+    if (!child) {
+        qFatal("no control %s", name);
+    }
+    return *child;
+}
+
+// The list window's script: the first row whose field equals value is chosen.
+void QueueChoice(ScriptedUi& ui, const char* field, const QString& value) {
+    ui.QueueModal([=](QWidget& window) {
+        auto& w = dynamic_cast<ListWindow&>(window);
+        ListModel& model = w.Model();
+        while (model.canFetchMore({})) {
+            model.fetchMore({});
+        }
+        for (int i = 0; i < model.rowCount(); ++i) {
+            if (model.Record(i).value(QLatin1String(field)).toString() == value) {
+                Child<QTableView>(w, "TDBGrid1").setCurrentIndex(model.index(i, 0));
+                Child<QPushButton>(w, "CmdOK").click();
+                return;
+            }
+        }
+        QFAIL(qPrintable(QStringLiteral("no row with %1 = %2").arg(QLatin1String(field), value)));
+    });
 }
 
 }  // namespace
@@ -74,28 +107,12 @@ FilingFixture::~FilingFixture() {
     SetClock({});
 }
 
-QDateTime FilingFixture::Moment() {
-    return QDateTime(QDate(2026, 3, 17), QTime(14, 5, 30));
-}
-
 QString FilingFixture::Source(const QString& fileName, const QByteArray& content) const {
-    const QString path = env_.Root() + QStringLiteral("/inbox/") + fileName;
-    if (!WriteFile(path, content)) {
-        throw std::runtime_error("cannot write " + path.toStdString());
-    }
-    return path;
+    return Written(env_.Root() + QStringLiteral("/inbox/") + fileName, content);
 }
 
 QString FilingFixture::ArchiveFile(const QString& relPath, const QByteArray& content) const {
-    const QString path = Docs() + QLatin1Char('/') + relPath;
-    if (!WriteFile(path, content)) {
-        throw std::runtime_error("cannot write " + path.toStdString());
-    }
-    return path;
-}
-
-QString FilingFixture::Docs() const {
-    return env_.DataDir() + QStringLiteral("/DOCS");
+    return Written(Docs() + QLatin1Char('/') + relPath, content);
 }
 
 QString FilingFixture::Request(int mode, const QString& path, const QString& name) {
@@ -111,42 +128,46 @@ QString FilingFixture::RunWithDialog(int mode, const QString& path, const QStrin
     return archived;
 }
 
-ProcessResult FilingFixture::RunProgram(const QStringList& args) const {
+ProcessResult FilingFixture::RunBatch(const QStringList& options, int mode, const QString& path,
+                                      const QString& name) const {
     QProcess p;
-    p.setProcessEnvironment(env_.ProgramEnvironment());
-    p.start(QStringLiteral(ZV_FILER), args);
+    p.setProcessEnvironment(Environment());
+    p.start(QStringLiteral(ZV_FILER),
+            QStringList{"--batch"} + options + QStringList{Request(mode, path, name)});
     if (!p.waitForFinished(60000)) {
         p.kill();
         p.waitForFinished();
         return {};
     }
-    ProcessResult r;
-    r.status = p.exitStatus() == QProcess::NormalExit ? p.exitCode() : -2;
-    r.out = QString::fromUtf8(p.readAllStandardOutput());
-    r.err = QString::fromUtf8(p.readAllStandardError());
-    return r;
-}
-
-QString FullName(const QString& relPath) {
-    return QStringLiteral("\\DOCS\\") +
-           QString(relPath).replace(QLatin1Char('/'), QLatin1Char('\\'));
+    return {p.exitStatus() == QProcess::NormalExit ? p.exitCode() : -2,
+            QString::fromUtf8(p.readAllStandardOutput()),
+            QString::fromUtf8(p.readAllStandardError())};
 }
 
 QList<QVariantMap> FilingFixture::DocsRows() {
     return Rows(QStringLiteral("MDOCS"), QStringLiteral("SELECT * FROM DOCS ORDER BY FULLNAME"));
 }
 
-void FilingFixture::ExecFile(const QString& database, const QString& sql) const {
-    const QString name = QUuid::createUuid().toString();
-    {
-        QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), name);
-        db.setDatabaseName(env_.DataDir() + QLatin1Char('/') + database + QStringLiteral(".MDB"));
-        QSqlQuery q(db);
-        if (!db.open() || !q.exec(sql)) {
-            throw std::runtime_error("cannot run " + sql.toStdString());
-        }
+QStringList FilingFixture::State() const {
+    QStringList files;
+    const QDir root(DataDir());
+    QDirIterator it(DataDir(), QDir::Files | QDir::Hidden | QDir::System,
+                    QDirIterator::Subdirectories);
+    while (it.hasNext()) {
+        const QString rel = root.relativeFilePath(it.next());
+        // Databases only by name: a failed write may leave them another size.
+        files << (rel.startsWith(QLatin1String("DOCS/"))
+                      ? rel + QLatin1Char(' ') + QString::number(it.fileInfo().size())
+                      : rel);
     }
-    QSqlDatabase::removeDatabase(name);
+    files.sort();
+    return files << QStringLiteral("DOCS rows: %1").arg(RowCount("MDOCS", "DOCS"))
+                 << QStringLiteral("UMEMO rows: %1").arg(RowCount("BM", "UMEMO"));
+}
+
+QString FullName(const QString& relPath) {
+    return QStringLiteral("\\DOCS\\") +
+           QString(relPath).replace(QLatin1Char('/'), QLatin1Char('\\'));
 }
 
 QByteArray Content(const QString& path) {
@@ -159,30 +180,71 @@ QStringList FolderEntries(const QString& path) {
         QDir::AllEntries | QDir::Hidden | QDir::System | QDir::NoDotAndDotDot, QDir::Name);
 }
 
-Unwritable::Unwritable(const QString& path) : path_(path) {
-    if (::geteuid() == 0) {
-        // Permissions do not stop root; the immutable attribute does, where the file system
-        // has it.
-        byFlag_ = true;
-        holds_ = SetImmutable(path_, true);
-    } else {
-        // A file is kept by its folder; a folder by its own permissions.
-        const QFileInfo info(path_);
-        const QString target = info.isDir() ? path_ : info.path();
-        holds_ = ::chmod(QFile::encodeName(target).constData(), 0555) == 0;
+Unwritable::Unwritable(const QString& path) : path_(path), holds_(Set(true)) {}
+
+Unwritable::~Unwritable() {
+    if (holds_) {
+        Set(false);
     }
 }
 
-Unwritable::~Unwritable() {
-    if (!holds_) {
-        return;
-    }
-    if (byFlag_) {
-        SetImmutable(path_, false);
-    } else {
+bool Unwritable::Set(bool on) const {
+    if (::geteuid() != 0) {
+        // A file is kept by its folder; a folder by its own permissions.
         const QFileInfo info(path_);
         const QString target = info.isDir() ? path_ : info.path();
-        ::chmod(QFile::encodeName(target).constData(), 0755);
+        return ::chmod(QFile::encodeName(target).constData(), on ? 0555 : 0755) == 0;
+    }
+    // Permissions do not stop root; the immutable attribute does, where the file system has it.
+    const int fd = ::open(QFile::encodeName(path_).constData(), O_RDONLY | O_NONBLOCK);
+    int flags = 0;
+    bool ok = fd >= 0 && ::ioctl(fd, FS_IOC_GETFLAGS, &flags) == 0;
+    if (ok) {
+        flags = on ? (flags | FS_IMMUTABLE_FL) : (flags & ~FS_IMMUTABLE_FL);
+        ok = ::ioctl(fd, FS_IOC_SETFLAGS, &flags) == 0;
+    }
+    if (fd >= 0) {
+        ::close(fd);
+    }
+    return ok;
+}
+
+void QueueFilingDialog(ScriptedUi& ui, const DialogInput& input,
+                       const std::function<void(FrmGetDocDet&)>& check) {
+    ui.QueueModal([input, check](QWidget& window) {
+        auto& d = dynamic_cast<FrmGetDocDet&>(window);
+        if (check) {
+            check(d);
+        }
+        if (!input.confirm) {
+            d.close();
+            return;
+        }
+        Child<QPushButton>(d, "CmdLak").click();
+        if (!input.tik.isEmpty()) {
+            Child<QPushButton>(d, "CmdTik").click();
+        }
+        if (input.name) {
+            Child<QLineEdit>(d, "TxtTeur").setText(*input.name);
+        }
+        Child<QComboBox>(d, "CboTeur").setCurrentText(input.description);
+        Child<QLineEdit>(d, "TxtRemark").setText(input.remark);
+        if (!input.reminderTime.isEmpty()) {
+            Child<QCheckBox>(d, "ChkIsMemo").click();
+            Child<QLineEdit>(d, "TDBTime1").setText(input.reminderTime);
+            if (input.popup) {
+                Child<QCheckBox>(d, "ChkIsJumpMemo").click();
+            }
+        }
+        Child<QPushButton>(d, "CmdOK").click();
+    });
+    // The list windows open from inside the dialog, before any window the request shows
+    // after it.
+    if (input.confirm) {
+        QueueChoice(ui, "NUM", QStringLiteral("1001"));
+        if (!input.tik.isEmpty()) {
+            QueueChoice(ui, "Tik", input.tik);
+        }
     }
 }
 

@@ -1,5 +1,7 @@
 #include "table_rows.h"
 
+#include <map>
+
 #include "data/database.h"
 #include "data/recordset.h"
 #include "util/state.h"
@@ -8,23 +10,16 @@ namespace zv::test {
 namespace {
 
 bool OnServer(const QString& database) {
-    if (database == QLatin1String("MDOCS")) {
-        return IsDocs();
-    }
-    if (database == QLatin1String("BM")) {
-        return IsBM();
-    }
-    if (database == QLatin1String("OFFICE")) {
-        return IsOffice();
-    }
-    return database == QLatin1String("ZORVA") && IsZorva();
+    static const std::map<QString, bool (*)()> flags{
+        {"MDOCS", IsDocs}, {"BM", IsBM}, {"OFFICE", IsOffice}, {"ZORVA", IsZorva}};
+    const auto flag = flags.find(database);
+    return flag != flags.end() && flag->second();
 }
 
 }  // namespace
 
 QList<QVariantMap> Rows(const QString& database, const QString& sql) {
-    auto db = Database::Open(database, OnServer(database));
-    auto rs = db->OpenRecordset(sql, dbOpenSnapshot);
+    auto rs = Database::Open(database, OnServer(database))->OpenRecordset(sql, dbOpenSnapshot);
     QList<QVariantMap> rows;
     for (; rs->RecordCount() > 0 && !rs->EOF(); rs->MoveNext()) {
         QVariantMap row;
