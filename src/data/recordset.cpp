@@ -415,15 +415,6 @@ void Recordset::MoveNext() {
     ++d_->pos;
 }
 
-void Recordset::MovePrevious() {
-    d_->BeforeMove();
-    if (BOF()) {
-        throw DataError(err::JetNoCurrentRecord);
-    }
-    d_->editMode = dbEditNone;
-    --d_->pos;
-}
-
 void Recordset::AddNew() {
     d_->RequireOpen();
     if (d_->kind == DbKind::Server && d_->editMode != dbEditNone) {
@@ -563,22 +554,6 @@ void Recordset::Close() {
 
 bool Recordset::IsOpen() const {
     return d_->open;
-}
-
-std::unique_ptr<Recordset> Recordset::Clone() const {
-    d_->RequireOpen();
-    auto impl = std::make_unique<Impl>();
-    impl->conn = d_->conn;
-    impl->kind = d_->kind;
-    impl->type = d_->type;
-    impl->source = d_->source;
-    impl->open = true;
-    impl->fields = d_->fields;
-    impl->declared = d_->declared;
-    impl->rows = d_->rows;
-    impl->nextId = d_->nextId;
-    impl->pos = d_->rows.isEmpty() ? -1 : 0;
-    return std::unique_ptr<Recordset>(new Recordset(std::move(impl)));
 }
 
 }  // namespace zv

@@ -53,7 +53,6 @@ class Recordset {
     void MoveFirst();
     void MoveLast();
     void MoveNext();
-    void MovePrevious();
 
     // Editing
     void AddNew();
@@ -79,8 +78,6 @@ class Recordset {
     void Open();
     void Close();
     bool IsOpen() const;
-
-    std::unique_ptr<Recordset> Clone() const;
 
   private:
     friend class Database;
