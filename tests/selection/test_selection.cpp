@@ -409,7 +409,8 @@ void TestSelection::chooseClient() {
     for (const auto& [num, name, doubleClick] : {std::tuple{u"1004"_s, u"Shaun O'Neil"_s, false},
                                                  {u"1002"_s, u"עיריית חולון"_s, true},
                                                  {u"77'7"_s, u"אנה טל"_s, false}}) {
-        Ui().QueueModal([&](QWidget& window) {
+        // Copies: clang 14 cannot capture a structured binding in a lambda.
+        Ui().QueueModal([&, num = num, doubleClick = doubleClick](QWidget& window) {
             auto& w = dynamic_cast<ListWindow&>(window);
             QCOMPARE(w.objectName(), kServer ? u"FrmLakAdo"_s : u"FrmLak"_s);
             Search(w, num);
