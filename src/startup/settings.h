@@ -22,7 +22,4 @@ void PrepareWorkDir(const QString& path);
 // The work folder, with a trailing separator.
 QString GetWorkDir();
 
-// The width of the primary screen in twips, after pending events have run.
-int ScreenWidthTwips();
-
 }  // namespace zv
