@@ -340,10 +340,6 @@ QString Recordset::FieldName(int index) const {
     return d_->fields[index];
 }
 
-bool Recordset::HasField(const QString& name) const {
-    return d_->FieldIndex(name) >= 0;
-}
-
 QVariant Recordset::Value(const QString& name) const {
     d_->RequireOpen();
     const int i = d_->RequireField(name);
@@ -397,15 +393,6 @@ void Recordset::MoveFirst() {
     d_->pos = 0;
 }
 
-void Recordset::MoveLast() {
-    d_->BeforeMove();
-    if (d_->rows.isEmpty()) {
-        throw DataError(err::JetNoCurrentRecord);
-    }
-    d_->editMode = dbEditNone;
-    d_->pos = d_->rows.size() - 1;
-}
-
 void Recordset::MoveNext() {
     d_->BeforeMove();
     if (EOF()) {
@@ -445,14 +432,6 @@ void Recordset::CancelUpdate() {
 
 int Recordset::EditMode() const {
     return d_->editMode;
-}
-
-QVariant Recordset::Bookmark() const {
-    d_->RequireOpen();
-    if (!d_->OnRow()) {
-        throw DataError(err::JetNoCurrentRecord);
-    }
-    return d_->rows[d_->pos].id;
 }
 
 void Recordset::SetBookmark(const QVariant& bookmark) {
@@ -550,10 +529,6 @@ void Recordset::Close() {
     d_->editMode = dbEditNone;
     d_->buffer.clear();
     d_->dirty.clear();
-}
-
-bool Recordset::IsOpen() const {
-    return d_->open;
 }
 
 }  // namespace zv

@@ -38,7 +38,6 @@ class Recordset {
     // Fields, by name without regard to case. An unknown name is error 3265.
     int FieldCount() const;
     QString FieldName(int index) const;
-    bool HasField(const QString& name) const;
     // The current row's value (or the pending edit's). A SQL NULL is a null QVariant.
     QVariant Value(const QString& name) const;
     // File kind: only inside AddNew/Edit (error 3020 otherwise). Server kind: edits the
@@ -51,7 +50,6 @@ class Recordset {
     bool BOF() const;
     bool EOF() const;
     void MoveFirst();
-    void MoveLast();
     void MoveNext();
 
     // Editing
@@ -62,7 +60,6 @@ class Recordset {
     int EditMode() const;
 
     // File kind
-    QVariant Bookmark() const;
     void SetBookmark(const QVariant& bookmark);
     QVariant LastModified() const;
     QString Name() const;  // the query text
@@ -77,7 +74,6 @@ class Recordset {
     void Find(const QString& criterion);  // "ID=1234": moves to the first match or to EOF
     void Open();
     void Close();
-    bool IsOpen() const;
 
   private:
     friend class Database;

@@ -101,10 +101,6 @@ bool IsDateValue(const QVariant& v) {
 
 }  // namespace
 
-bool IsEmptyVal(const QVariant& v) {
-    return !v.isValid();
-}
-
 bool IsNullVal(const QVariant& value) {
     return value.isValid() && value.isNull();
 }

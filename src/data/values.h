@@ -13,7 +13,6 @@ inline QVariant Empty() {
 inline QVariant Null() {
     return QVariant(QMetaType(QMetaType::QString));
 }
-bool IsEmptyVal(const QVariant& v);
 
 // Apostrophes doubled, for a value placed between apostrophes in SQL.
 QString FixQuote(const QVariant& value);
