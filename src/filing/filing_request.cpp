@@ -1,6 +1,7 @@
 #include "filing/filing_request.h"
 
 #include <QDir>
+#include <QDirIterator>
 #include <QStringList>
 #include <memory>
 
@@ -27,6 +28,25 @@ QString FolderOf(const QString& fileNameToSave) {
         dir += QDir::separator();
     }
     return dir;
+}
+
+// The file that holds the target's name: the target itself, or else one whose name differs
+// from it only in case, which the suite's tables and its other file systems take for the same
+// file. Empty when there is none.
+QString ExistingFile(const QString& target) {
+    if (IsFileExist(target)) {
+        return target;
+    }
+    const qsizetype cut = LastSeparator(target) + 1;
+    const QString name = target.mid(cut);
+    QDirIterator it(DiskPath(target.left(cut)), QDir::Files | QDir::Hidden | QDir::System);
+    while (it.hasNext()) {
+        it.next();
+        if (it.fileName().compare(name, Qt::CaseInsensitive) == 0) {
+            return target.left(cut) + it.fileName();
+        }
+    }
+    return {};
 }
 
 // A mail keeps its source's own extension: "name.msg" from an .eml file is "name.msg.eml".
@@ -127,13 +147,16 @@ bool Filing::Do(const std::function<void()>& step) {
 bool Filing::ResolveClash(const QString& proposed) {
     const bool document = mode_ == 1;
     QString shown = proposed;
-    while (IsFileExist(target_)) {
-        const std::optional<QString> chosen = resolve_(Clash{target_, shown, dir_, document});
+    for (QString existing = ExistingFile(target_); !existing.isEmpty();
+         existing = ExistingFile(target_)) {
+        const std::optional<QString> chosen = resolve_(Clash{existing, shown, dir_, document});
         if (!chosen) {
             return false;
         }
         const QString next = document ? *chosen : MailExtensionRule(*chosen);
-        if (next == target_) {
+        if (next.compare(existing, Qt::CaseInsensitive) == 0) {
+            // Replaced under its own name: no second file beside it, one row for both.
+            target_ = existing;
             break;
         }
         target_ = next;

@@ -143,6 +143,11 @@ void TestFilingBatch::batch_data() {
                                        {}, 1,       "יש לקבוע שם לקובץ הנשמר"};
     QTest::newRow("clash left alone") << Run{
         1, "a.pdf", "--client|1001", {pdf}, 1, "קיים קובץ בשם זה, המסמך לא תויק :\n%D/" + pdf};
+    // Names that differ only in case are one file to the suite's tables.
+    QTest::newRow("clash in another case left alone") << Run{
+        1, "a.pdf", "--client|1001", {kDoc + ".PDF"}, 1, "המסמך לא תויק :\n%D/" + kDoc + ".PDF"};
+    QTest::newRow("clash in another case overwritten") << Run{
+        1, "a.pdf", "--client|1001|--on-clash|overwrite", {kDoc + ".PDF"}, 0, kDoc + ".PDF", "F"};
     QTest::newRow("usage error") << Run{1, "a.pdf", "--case|2", {}, 2, "--batch needs --client"};
 }
 
