@@ -1,8 +1,6 @@
 // The program with its windows, loaded by zorvane-filer for every run that may show one.
 
 #include <QApplication>
-#include <QFont>
-#include <QFontDatabase>
 #include <QLibraryInfo>
 #include <QTranslator>
 
@@ -11,13 +9,14 @@
 #include "filing/filing_request_handler.h"
 #include "startup/command_line.h"
 #include "ui/console_ui.h"
+#include "ui/font_fix.h"
 #include "ui/qt_ui.h"
 #include "util/ui.h"
 
 namespace {
 
 // Hebrew button texts in Qt's own dialogs, right to left, and a Hebrew-capable family where
-// the suite's "MS Sans Serif" is not installed.
+// the suite's font is not installed.
 void PrepareHebrewUi() {
     QApplication::setLayoutDirection(Qt::RightToLeft);
     auto* translator = new QTranslator(qApp);
@@ -25,10 +24,7 @@ void PrepareHebrewUi() {
                          QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
         QApplication::installTranslator(translator);
     }
-    const QString suiteFamily = QStringLiteral("MS Sans Serif");
-    if (!QFontDatabase::families().contains(suiteFamily)) {
-        QFont::insertSubstitution(suiteFamily, QStringLiteral("DejaVu Sans"));
-    }
+    zv::SubstituteFixedFont();
 }
 
 }  // namespace

@@ -30,16 +30,6 @@ const QStringList& HebrewFallbacks() {
     return families;
 }
 
-void EnsureSubstitution() {
-    static const bool done = [] {
-        if (!QFontDatabase::hasFamily(FixedFontFamily())) {
-            QFont::insertSubstitutions(FixedFontFamily(), HebrewFallbacks());
-        }
-        return true;
-    }();
-    Q_UNUSED(done);
-}
-
 // The name a control has in its window: a member of a control array ("Option1_2") goes by
 // the array's name.
 QString ControlName(const QWidget& w) {
@@ -87,6 +77,16 @@ QString FixedFontFamily() {
     return QStringLiteral("MS Sans Serif");
 }
 
+void SubstituteFixedFont() {
+    static const bool done = [] {
+        if (!QFontDatabase::hasFamily(FixedFontFamily())) {
+            QFont::insertSubstitutions(FixedFontFamily(), HebrewFallbacks());
+        }
+        return true;
+    }();
+    Q_UNUSED(done);
+}
+
 const QStringList& SymbolButtonNames() {
     static const QStringList names = {
         QStringLiteral("CmdSearch"),       QStringLiteral("CmdSetTikMovil"),
@@ -124,7 +124,7 @@ void FixControlCharset(QWidget& ctl) {
          IsSymbolButtonName(ctl))) {
         return;
     }
-    EnsureSubstitution();
+    SubstituteFixedFont();
     // The Hebrew character set of the suite's fonts is implied by Unicode text.
     QFont font = ctl.font();
     font.setFamily(FixedFontFamily());

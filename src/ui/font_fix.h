@@ -13,6 +13,8 @@ namespace zv {
 
 // The family the fixes give; substituted on systems that lack it.
 QString FixedFontFamily();
+// Makes families with Hebrew glyphs stand in for it where it is not installed (once).
+void SubstituteFixedFont();
 // The names of the check boxes that serve as symbol buttons across the suite's windows.
 const QStringList& SymbolButtonNames();
 // The marker file of the current user.
