@@ -4,8 +4,11 @@
 
 #include "archive/date_values.h"
 #include "archive/docs_row.h"
+#include "archive/memo.h"
 #include "archive/next_doc_id.h"
 #include "archive/remark.h"
+#include "data/database.h"
+#include "data/recordset.h"
 #include "data/values.h"
 #include "filing_fixture.h"
 #include "sample_install/test_server.h"
@@ -105,6 +108,7 @@ class TestDocsRow : public QObject {
     void reminders_data();
     void reminders();
     void untickRemovesOnlyOwnReminders();
+    void idReadingZeroIsReported();
     void missingColumn();
     void notSavedEndsSilently();
     void backEndsChosenApart();
@@ -246,6 +250,21 @@ void TestDocsRow::untickRemovesOnlyOwnReminders() {
     QCOMPARE(Memos(99999), QStringList{"A/31/2"});
     QCOMPARE(Text(DocRow(kLetter)["ISMEMO"]), u"1"_s);
     QVERIFY(f.Ui().Texts().isEmpty());
+}
+
+// A row whose ID reads 0 (a server row refiled keeps its ID) gets no reminders under ID 0.
+void TestDocsRow::idReadingZeroIsReported() {
+    FilingFixture f(kServer);
+    Execute(u"MDOCS"_s,
+            u"INSERT INTO DOCS (ID, FULLNAME, IsMemo, IsJumpMemo, MemoDate, MemoHour, Metapel) "
+            "VALUES (0, '\\zero.doc', 0, 1, '2026-12-20 00:00:00', '09:00', 'A')"_s);
+    auto db = Database::Open(u"MDOCS"_s, IsDocs());
+    auto rs = db->OpenRecordset(u"SELECT * FROM DOCS WHERE FULLNAME='\\zero.doc'"_s);
+
+    CheckMemo(u"DOCS"_s, rs.get());
+
+    QCOMPARE(f.Ui().Texts(), QStringList{u"בעיה בקוד זיהוי בטבלה : DOCS"_s});
+    QVERIFY(Memos(0).isEmpty());
 }
 
 // A column a table lacks is reported; the rest of the row and the reminders are saved.

@@ -48,6 +48,7 @@ class TestFilingBatch : public QObject {
     void options();
     void mailNameStaysInFolder();
     void unsavedRowKeepsReplacedFile();
+    void failedCopyKeepsEarlierFile();
     void batch_data();
     void batch();
     void everyDetail();
@@ -111,6 +112,18 @@ void TestFilingBatch::unsavedRowKeepsReplacedFile() {
     QCOMPARE(Content(source), QByteArray("new"));
 }
 
+// A copy that fails leaves the file it was to replace as it was, and nothing beside it.
+void TestFilingBatch::failedCopyKeepsEarlierFile() {
+    FilingFixture f;
+    const QString existing = f.ArchiveFile(u"DOC1001/מסמך.pdf"_s, "old");
+    const QString source = f.Source(u"x.pdf"_s);
+    QVERIFY(QFile::remove(source));
+    QCOMPARE(FileInto(f, 1, source, {}, [](const Clash& c) { return c.proposed; }), QString());
+    QCOMPARE(Content(existing), QByteArray("old"));
+    QCOMPARE(FolderEntries(f.Docs() + u"/DOC1001"_s), QStringList{u"מסמך.pdf"_s});
+    QVERIFY(f.DocsRows().isEmpty());
+}
+
 void TestFilingBatch::batch_data() {
     QTest::addColumn<Run>("r");
     const QString pdf = kDoc + ".pdf";
@@ -148,6 +161,9 @@ void TestFilingBatch::batch_data() {
         1, "a.pdf", "--client|1001", {kDoc + ".PDF"}, 1, "המסמך לא תויק :\n%D/" + kDoc + ".PDF"};
     QTest::newRow("clash in another case overwritten") << Run{
         1, "a.pdf", "--client|1001|--on-clash|overwrite", {kDoc + ".PDF"}, 0, kDoc + ".PDF", "F"};
+    // The copy is written, then cannot take the name: its partial file goes too.
+    QTest::newRow("folder where the file should be")
+        << Run{1, "a.pdf", "--client|1001", {pdf + "/"}, 1, "75-0-WorkWithStr-"};
     QTest::newRow("usage error") << Run{1, "a.pdf", "--case|2", {}, 2, "--batch needs --client"};
 }
 
@@ -156,7 +172,11 @@ void TestFilingBatch::batch() {
     FilingFixture f;
     const QString source = f.Source(r.source, "new");
     for (const QString& rel : r.existing) {
-        f.ArchiveFile(rel, "old, longer");
+        if (rel.endsWith('/')) {
+            QVERIFY(QDir().mkpath(f.Docs() + '/' + rel));
+        } else {
+            f.ArchiveFile(rel, "old, longer");
+        }
     }
     const QStringList before = FolderEntries(f.Docs() + u"/DOC1001"_s);
 
@@ -183,7 +203,9 @@ void TestFilingBatch::batch() {
     QCOMPARE(Content(source), QByteArray("new"));
     QCOMPARE(FolderEntries(f.Docs() + u"/DOC1001"_s), before);
     for (const QString& rel : r.existing) {
-        QCOMPARE(Content(f.Docs() + '/' + rel), QByteArray("old, longer"));
+        if (!rel.endsWith('/')) {
+            QCOMPARE(Content(f.Docs() + '/' + rel), QByteArray("old, longer"));
+        }
     }
     QVERIFY(rows.isEmpty());
 }

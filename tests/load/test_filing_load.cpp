@@ -52,7 +52,9 @@ void TestFilingLoad::everyDocumentFiledOnce() {
     QElapsedTimer timer;
     timer.start();
     if (writer) {
-        QTest::qWait(1000);  // well inside the busy timeout of the waiting writers
+        // Long enough for every process to read the same highest ID even under the
+        // sanitizers, well inside the busy timeout of the waiting writers.
+        QTest::qWait(3000);
         writer->Execute(u"ROLLBACK"_s);
         writer.reset();
     }
